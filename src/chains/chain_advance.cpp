@@ -1,0 +1,82 @@
+// The pendulum arithmetic shared by the swing step and the chain update.
+// Every intermediate is a double, record fields are rounded to float when
+// stored, and every integer comes from truncation toward zero.
+#include <cmath>
+
+#include "chains/float_math.h"
+#include "chains/run_data.h"
+#include "chains/swing_step.h"
+
+namespace {
+
+// 3.14159 / 180: the degree factor the chains have always used. It is a
+// little short of pi / 180, so angle 0 does not hang exactly below the anchor.
+constexpr double kDegree = 0.017453277777777776;
+constexpr double kPlacementOffset = 90.0;       // angle 0 hangs straight down
+constexpr double kDirectionStep = 0.08888888888888889;  // 32 directions per 360 degrees
+
+void PlaceObject(HostObject& object, double x, double y) {
+  object.head.x = TruncateToInt(x, object.head.x);
+  object.head.y = TruncateToInt(y, object.head.y);
+  object.changed = 1;
+}
+
+}  // namespace
+
+int32_t ChainDirection(float angle, int32_t unchanged) {
+  if (!std::isfinite(angle)) return unchanged;
+  const int32_t a = TruncateToInt(static_cast<double>(angle) * -1.0 + 90.0, 0);
+  const int32_t s = TruncateToInt(a * kDirectionStep, 0);
+  const int32_t d = s % 32;
+  return d < 0 ? d + 32 : d;
+}
+
+void AdvanceChain(RunData& rd, uint32_t chain, bool turn) {
+  const uint32_t n = LinksPerChain(rd);
+  // No event is raised here, so the record and the objects stay where they
+  // are for the whole call.
+  ChainRecord& r = rd.chains->At(chain);
+  const HostObjectHeader& anchor = r.anchor->head;
+
+  const double speed = static_cast<double>(r.speed) + r.acceleration;
+  r.speed = RoundToFloat(speed);
+  const double angle = speed + r.angle;
+  r.angle = RoundToFloat(angle);
+
+  // The chain's length always comes from the first object of the whole links
+  // list. With no link at all there is nothing to measure: h0 is 0.
+  const int32_t h0 = LinkCount(rd) > 0 ? rd.links->At(0)->head.height : 0;
+  const int32_t length =
+      TruncateToInt((static_cast<double>(h0) + r.linkSpacing) * (static_cast<double>(n) + 1.0), 0);
+
+  // A pendulum of no length has no torque; dividing by it would not be finite.
+  if (length == 0) {
+    r.acceleration = 0.0f;
+  } else {
+    const double pull = -(static_cast<double>(rd.gravity) * r.mass) / length;
+    r.acceleration = RoundToFloat(std::sin(angle * kDegree) * pull);
+  }
+
+  r.prevPlatformX = r.platformX;
+  r.prevPlatformY = r.platformY;
+  const double theta = (static_cast<double>(r.angle) + kPlacementOffset) * kDegree;
+  const double cosTheta = std::cos(theta);
+  const double sinTheta = std::sin(theta);
+  r.platformX = RoundToFloat(cosTheta * length + anchor.x);
+  r.platformY = RoundToFloat(sinTheta * length + anchor.y);
+
+  // Each link stands at its own height (plus spacing) times its place, so
+  // links of differing heights need not end where the platform hangs.
+  for (uint32_t k = 1; k <= n; ++k) {
+    HostObject& link = *LinkOfChain(rd, chain, k);
+    const double step = static_cast<double>(link.head.height) + r.linkSpacing;
+    const double distance = step * static_cast<double>(static_cast<float>(k));
+    PlaceObject(link, cosTheta * distance + anchor.x, sinTheta * distance + anchor.y);
+    if (turn) link.direction = ChainDirection(r.angle, link.direction);
+  }
+
+  if (HostObject* platform = PlatformOfChain(rd, chain)) {
+    PlaceObject(*platform, r.platformX, r.platformY);
+    if (turn) platform->direction = ChainDirection(r.angle, platform->direction);
+  }
+}
