@@ -11,7 +11,9 @@ int32_t TVCALL ChainIsSwinging(RunData* rd, intptr_t index, intptr_t) {
 
 // The swing step sets currentChain just before it raises this condition, so
 // during that event it is true only for the chain just moved. Outside the
-// event it compares with the chain that last raised it (-1 before the first).
+// event it compares with the chain that last raised it. Before the first event
+// currentChain is -1, and a negative index names no chain, so it is false.
 int32_t TVCALL OnSwing(RunData* rd, intptr_t index, intptr_t) {
-  return IntegerParameter(index) == rd->currentChain ? 1 : 0;
+  const int32_t chain = IntegerParameter(index);
+  return chain >= 0 && chain == rd->currentChain ? 1 : 0;
 }

@@ -54,7 +54,8 @@ TEST_F(ConditionTest, OnSwingOutsideTheEventComparesWithTheLastChainThatRaisedIt
   AddAnchor(0, 50);
   AddAnchor(100, 50);
   AddLink(0, 0);
-  EXPECT_EQ(host.Condition(condition::OnSwing, 0), 0);  // nothing has swung yet
+  // Nothing has swung yet: false for every index, -1 included.
+  for (intptr_t index : {0, 1, -1}) EXPECT_EQ(host.Condition(condition::OnSwing, index), 0) << index;
   host.Action(action::StartChain, 1);
   host.RunFrame();
   EXPECT_EQ(host.Condition(condition::OnSwing, 0), 0);
