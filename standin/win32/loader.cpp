@@ -1,7 +1,7 @@
 // Plays the system loader's part for the library off Windows: once the
 // library is in memory, its entry point is called with the module handle
 // under which its resources are found.
-#include <windows.h>
+#include "standin_win32.h"
 
 extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved);
 

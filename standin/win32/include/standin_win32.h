@@ -1,0 +1,21 @@
+// What the Win32 stand-in offers beyond the Win32 calls: the module handle
+// under which the library's resources are found, and hooks through which
+// tests make allocations fail and count what is still alive. The library's
+// own code never includes this header.
+#pragma once
+
+#include <windows.h>
+
+#include <cstddef>
+
+// The library's module instance handle (the one DllMain received).
+HINSTANCE StandinLibraryModule();
+
+// After `successes` more calls succeed, the next `failures` calls of
+// LocalAlloc (or CreatePopupMenu) fail as they do when memory runs out.
+void StandinFailLocalAlloc(int successes, int failures = 1);
+void StandinFailCreatePopupMenu(int successes, int failures = 1);
+
+// Menus and local memory blocks created and not yet destroyed or freed.
+std::size_t StandinLiveMenuCount();
+std::size_t StandinLiveLocalBlockCount();
