@@ -1,0 +1,73 @@
+// A fixed scene played for many frames gives the same bits on every build:
+// the native library and the Windows ones hash to one golden value. A change
+// of this value means results changed, on one build or on all.
+#include <bit>
+#include <cstdint>
+#include <cstdio>
+
+#include <gtest/gtest.h>
+
+#include "chain_scene.h"
+#include "chains/swing_step.h"
+
+namespace {
+
+class Fnv1a {
+ public:
+  void Add(uint32_t word) {
+    for (int i = 0; i < 4; ++i) {
+      hash_ = (hash_ ^ ((word >> (8 * i)) & 0xFFu)) * 0x100000001B3ull;
+    }
+  }
+  void Add(float value) { Add(std::bit_cast<uint32_t>(value)); }
+  void Add(int32_t value) { Add(static_cast<uint32_t>(value)); }
+  uint64_t value() const { return hash_; }
+
+ private:
+  uint64_t hash_ = 0xCBF29CE484222325ull;
+};
+
+uint64_t PlayFixedScene() {
+  ChainScene scene;
+  const float angles[] = {90.0f, -35.5f, 12.25f, 170.0f};
+  const float masses[] = {1.0f, 3.5f, 0.25f, 9.0f};
+  for (int c = 0; c < 4; ++c) {
+    scene.Anchor(120 * c - 100, 40 + 7 * c);
+    ChainRecord& chain = scene.Chain(static_cast<uint32_t>(c));
+    chain.angle = angles[c];
+    chain.mass = masses[c];
+    chain.linkSpacing = 1.5f * static_cast<float>(c);
+    chain.swinging = 1;
+    scene.Platform();
+  }
+  for (int l = 0; l < 22; ++l) scene.Link(12 + (l * 7) % 19);
+
+  Fnv1a hash;
+  for (int frame = 0; frame < 3000; ++frame) {
+    scene.host.RunFrame();
+    if (frame % 97 == 0) UpdateChainAt(scene.rd, frame % 4);
+    if (frame % 250 == 0) scene.Chain(static_cast<uint32_t>(frame % 4)).speed += 0.75f;
+  }
+  for (uint32_t c = 0; c < scene.rd.chains->Count(); ++c) {
+    const ChainRecord& r = scene.Chain(c);
+    for (float value : {r.mass, r.angle, r.speed, r.linkSpacing, r.prevPlatformX, r.prevPlatformY,
+                        r.platformX, r.platformY, r.acceleration}) {
+      hash.Add(value);
+    }
+  }
+  for (ObjectList* list : {scene.rd.links, scene.rd.platforms}) {
+    for (uint32_t i = 0; i < list->Count(); ++i) {
+      const HostObject& object = *list->At(i);
+      hash.Add(object.head.x);
+      hash.Add(object.head.y);
+      hash.Add(object.direction);
+    }
+  }
+  return hash.value();
+}
+
+TEST(Determinism, FixedSceneHashesToTheGoldenValueOnEveryBuild) {
+  EXPECT_EQ(PlayFixedScene(), 0x32457d7314b34651ull) << std::hex << "hash 0x" << PlayFixedScene();
+}
+
+}  // namespace
