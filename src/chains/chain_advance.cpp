@@ -67,8 +67,9 @@ void AdvanceChain(RunData& rd, uint32_t chain, bool turn) {
 
   // Each link stands at its own height (plus spacing) times its place, so
   // links of differing heights need not end where the platform hangs.
+  const uint32_t first = n * chain;  // link k of the chain is element first + k - 1
   for (uint32_t k = 1; k <= n; ++k) {
-    HostObject& link = *LinkOfChain(rd, chain, k);
+    HostObject& link = *rd.links->At(first + k - 1);
     const double step = static_cast<double>(link.head.height) + r.linkSpacing;
     const double distance = step * static_cast<double>(static_cast<float>(k));
     PlaceObject(link, cosTheta * distance + anchor.x, sinTheta * distance + anchor.y);

@@ -1,0 +1,130 @@
+// Runs an arbitrary event program against one run-time object through the
+// stand-in host: objects created and destroyed, any action with any index and
+// value (infinities and NaN included), conditions, expressions and frames,
+// with further actions run from inside "On Swing". Nothing may crash, read
+// freed memory or convert a value it cannot represent.
+#include <bit>
+#include <cstdint>
+#include <cstring>
+#include <vector>
+
+#include "frame/edit_data.h"
+#include "host.h"
+
+namespace {
+
+class Program {
+ public:
+  Program(const uint8_t* data, size_t size) : data_(data), size_(size) {}
+
+  bool done() const { return pos_ >= size_; }
+  uint8_t Byte() { return pos_ < size_ ? data_[pos_++] : 0; }
+  int32_t Int() {
+    uint32_t value = 0;
+    for (int i = 0; i < 4; ++i) value = (value << 8) | Byte();
+    return static_cast<int32_t>(value);
+  }
+  // Mostly small indexes, sometimes any 32-bit value.
+  int32_t Index() {
+    const uint8_t b = Byte();
+    return b < 240 ? static_cast<int32_t>(b % 8) - 1 : Int();
+  }
+
+ private:
+  const uint8_t* data_;
+  size_t size_;
+  size_t pos_ = 0;
+};
+
+class Run {
+ public:
+  Run(const uint8_t* data, size_t size) : program_(data, size), host_(Settings(program_)) {
+    host_.onEvent = [this](int32_t, int32_t) {
+      // An "On Swing" rule of up to three actions, conditions or expressions.
+      for (int i = 0; i < 3 && !program_.done() && depth_ < 2; ++i) {
+        ++depth_;
+        Step(false);
+        --depth_;
+      }
+    };
+  }
+
+  void Play() {
+    while (!program_.done()) Step(true);
+  }
+
+ private:
+  static EditData Settings(Program& program) {
+    EditData edit{};
+    WriteEditDataDefaults(edit);
+    // Raw bytes for the four texts: the conversion must cope with any.
+    for (char* text : {edit.startAngleText, edit.massText, edit.gravityText, edit.linkSpacingText}) {
+      for (size_t i = 0; i < kSettingTextSize; ++i) text[i] = static_cast<char>(program.Byte());
+    }
+    return edit;
+  }
+
+  intptr_t ObjectArgument() {
+    if (objects_.empty()) return 0;
+    return reinterpret_cast<intptr_t>(objects_[program_.Byte() % objects_.size()]);
+  }
+
+  void Step(bool mayRunFrame) {
+    switch (program_.Byte() % 7) {
+      case 0: {
+        const int32_t x = program_.Int(), y = program_.Int(), height = program_.Int();
+        const standin::ObjectId id{static_cast<int16_t>(program_.Byte()), program_.Byte()};
+        objects_.push_back(host_.AddObject(x, y, height, id));
+        break;
+      }
+      case 1: {
+        const int code = program_.Byte() % 16;
+        if (code <= 2) {
+          host_.Action(code, ObjectArgument());
+        } else {
+          const int32_t index = program_.Index();
+          const int32_t integer = program_.Int();
+          const float value = std::bit_cast<float>(program_.Int());
+          host_.Action(code, index, integer, value);
+        }
+        break;
+      }
+      case 2:
+        host_.Condition(program_.Byte() % 2, program_.Index());
+        break;
+      case 3: {
+        const int code = program_.Byte() % 17;
+        const int32_t first = program_.Index();
+        host_.Expression(code, {first, program_.Index()});
+        break;
+      }
+      case 4:
+        if (mayRunFrame) host_.RunFrame();
+        break;
+      case 5:
+        // A destroyed object must not be handed to the library again: the
+        // host frees it after the next frame.
+        if (!objects_.empty()) {
+          const size_t which = program_.Byte() % objects_.size();
+          host_.Destroy(objects_[which]);
+          objects_.erase(objects_.begin() + static_cast<std::ptrdiff_t>(which));
+        }
+        break;
+      default:
+        for (int frames = program_.Byte() % 8; frames > 0 && mayRunFrame; --frames) host_.RunFrame();
+        break;
+    }
+  }
+
+  Program program_;
+  standin::Host host_;
+  std::vector<HostObject*> objects_;
+  int depth_ = 0;
+};
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+  Run(data, size).Play();
+  return 0;
+}

@@ -1,0 +1,88 @@
+// Memory that cannot be had: the run-time object is refused whole, and a list
+// keeps what it held when an append fails.
+#include <cstdlib>
+#include <new>
+
+#include <gtest/gtest.h>
+
+#include "chains/run_data.h"
+#include "frame/edit_data.h"
+#include "frame/exports.h"
+
+namespace {
+
+int g_allocationsBeforeFailure = -1;  // -1: never fail
+
+}  // namespace
+
+void* operator new(std::size_t size) {
+  if (g_allocationsBeforeFailure == 0) throw std::bad_alloc();
+  if (g_allocationsBeforeFailure > 0) --g_allocationsBeforeFailure;
+  if (void* p = std::malloc(size == 0 ? 1 : size)) return p;
+  throw std::bad_alloc();
+}
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+  try {
+    return operator new(size);
+  } catch (...) {
+    return nullptr;
+  }
+}
+void operator delete(void* p) noexcept { std::free(p); }
+void operator delete(void* p, std::size_t) noexcept { std::free(p); }
+
+namespace {
+
+struct FailAfter {
+  explicit FailAfter(int allocations) { g_allocationsBeforeFailure = allocations; }
+  ~FailAfter() { g_allocationsBeforeFailure = -1; }
+};
+
+TEST(AllocationFailure, CreationIsRefusedWholeWhenAnyListCannotBeMade) {
+  EditData edit{};
+  WriteEditDataDefaults(edit);
+  for (int succeeding = 0; succeeding < 3; ++succeeding) {
+    alignas(8) unsigned char storage[sizeof(RunData)] = {};
+    auto* rd = reinterpret_cast<RunData*>(storage);
+    int16_t result;
+    {
+      FailAfter fail(succeeding);
+      result = CreateRunObject(rd, &edit, nullptr);
+    }
+    EXPECT_EQ(result, -1) << succeeding << " allocations succeeded";
+    EXPECT_EQ(rd->links, nullptr);
+    EXPECT_EQ(rd->platforms, nullptr);
+    EXPECT_EQ(rd->chains, nullptr);
+    // Later routines tolerate the object without lists.
+    EXPECT_EQ(HandleRunObject(rd), 0);
+    EXPECT_EQ(DestroyRunObject(rd, 0), 0);
+  }
+}
+
+TEST(AllocationFailure, AFailedAppendLeavesTheListAsItWas) {
+  ObjectList list;
+  HostObject a{}, b{}, c{};
+  ASSERT_TRUE(list.Append(&a));
+  ASSERT_TRUE(list.Append(&b));
+  bool appended = true;
+  {
+    FailAfter fail(0);
+    // Two elements fill a vector's storage of two, so the third must grow it.
+    appended = list.Append(&c);
+  }
+  EXPECT_FALSE(appended);
+  ASSERT_EQ(list.Count(), 2u);
+  EXPECT_EQ(list.At(0), &a);
+  EXPECT_EQ(list.At(1), &b);
+
+  ChainList chains;
+  bool added = true;
+  {
+    FailAfter fail(0);
+    added = chains.Append(ChainRecord{});
+  }
+  EXPECT_FALSE(added);
+  EXPECT_EQ(chains.Count(), 0u);
+}
+
+}  // namespace
