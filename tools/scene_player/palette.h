@@ -3,6 +3,7 @@
 // colour and the shade in which its trail is drawn if it serves as a platform.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <vector>
 
