@@ -1,5 +1,7 @@
 #!/usr/bin/env bash
-# Builds the shipping DLL and the native library and says where they are.
+# The main job: builds the shipping DLL and the native library with the
+# tools, plays the embedded demo scene against the library, and says where
+# the DLL and the animated GIF are.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 scripts/install-deps.sh
@@ -8,5 +10,8 @@ for preset in release mingw-i686; do
   cmake --preset "$preset" >/dev/null
   cmake --build --preset "$preset" -j "$jobs" >/dev/null
 done
+mkdir -p out
+build/release/tools/scene_player/scene_player --gif out/demo.gif >/dev/null
 echo "tavrin.dll (for the host):  $(pwd)/build/mingw-i686/tavrin.dll"
 echo "libtavrin.so (native):      $(pwd)/build/release/libtavrin.so"
+echo "the demo, played:           $(pwd)/out/demo.gif"

@@ -1,0 +1,211 @@
+#include "player.h"
+
+#include <algorithm>
+#include <bit>
+#include <cmath>
+#include <cstring>
+#include <stdexcept>
+#include <string>
+#include <utility>
+
+#include "chains/float_math.h"
+#include "event_names.h"
+
+namespace scene_player {
+
+namespace {
+
+constexpr int32_t kOnSwingCondition = 1;
+
+EditData SettingsRecord(const Settings& settings) {
+  EditData data{};
+  auto copy = [](char (&field)[kSettingTextSize], const std::string& text) {
+    std::strncpy(field, text.c_str(), sizeof field - 1);
+  };
+  copy(data.startAngleText, settings.startAngle);
+  copy(data.massText, settings.mass);
+  copy(data.gravityText, settings.gravity);
+  copy(data.linkSpacingText, settings.linkSpacing);
+  return data;
+}
+
+int32_t ToInteger(double value) { return TruncateToInt(value, 0); }
+
+void CollectCodes(const Value& value, std::vector<int>& expressions) {
+  if (value.expression >= 0) expressions.push_back(value.expression);
+  for (const Value& param : value.params) CollectCodes(param, expressions);
+}
+
+void CollectCodes(const std::vector<Step>& steps, std::vector<int>& actions, std::vector<int>& expressions) {
+  for (const Step& step : steps) {
+    if (step.kind == Step::Kind::Action) actions.push_back(step.action);
+    for (const Value& value : step.values) CollectCodes(value, expressions);
+  }
+}
+
+}  // namespace
+
+Player::Player(const Scene& scene) : scene_(scene), host_(SettingsRecord(scene.settings)), extension_(&host_.extension()) {
+  if (!host_.created()) throw std::runtime_error("the library refused to create its run-time object");
+  CheckRoutines();
+  objects_.resize(scene_.objects.size());
+  for (std::size_t i = 0; i < scene_.objects.size(); ++i) {
+    if (scene_.objects[i].atStart) Create(i);
+  }
+  host_.onEvent = [this](int32_t code, int32_t) { OnEvent(code); };
+}
+
+// A library whose tables lack a routine would crash the first time the scene
+// used it; say so before playing anything.
+void Player::CheckRoutines() const {
+  std::vector<int> actions, expressions;
+  for (const TimelineEntry& entry : scene_.timeline) CollectCodes(entry.steps, actions, expressions);
+  for (const SwingRule& rule : scene_.rules) CollectCodes(rule.steps, actions, expressions);
+  const RunInfo& info = host_.info();
+  for (int code : actions) {
+    if (code >= info.actionCount || info.actionRoutines[code] == nullptr) {
+      throw std::runtime_error(std::string("the library has no routine for the action \"") +
+                               kActionNames[code].displayText + "\"");
+    }
+  }
+  for (int code : expressions) {
+    if (code >= info.expressionCount || info.expressionRoutines[code] == nullptr) {
+      throw std::runtime_error(std::string("the library has no routine for the expression \"") +
+                               kExpressionNames[code].displayText + "\"");
+    }
+  }
+  if (!scene_.rules.empty() &&
+      (kOnSwingCondition >= info.conditionCount || info.conditionRoutines[kOnSwingCondition] == nullptr)) {
+    throw std::runtime_error("the library has no routine for the condition \"On Swing %0\"");
+  }
+}
+
+void Player::Create(std::size_t index) {
+  const ObjectSpec& spec = scene_.objects[index];
+  ObjectState& target = objects_[index];
+  target.object = host_.AddObject(spec.x, spec.y, spec.height, {spec.idLow, spec.idHigh});
+  target.state = State::Live;
+  target.exactX = spec.x;
+  target.exactY = spec.y;
+}
+
+void Player::PlayFrame(int frame) {
+  for (; nextEntry_ < scene_.timeline.size() && scene_.timeline[nextEntry_].frame <= frame; ++nextEntry_) {
+    RunSteps(scene_.timeline[nextEntry_].steps);
+  }
+  // The host frees the objects destroyed so far once this frame's handle
+  // call has run; those destroyed by rules during it wait for the next frame.
+  std::vector<std::size_t> freed;
+  for (std::size_t i = 0; i < objects_.size(); ++i) {
+    if (objects_[i].state == State::Destroyed) freed.push_back(i);
+  }
+  host_.RunFrame();
+  for (std::size_t i : freed) objects_[i] = ObjectState{State::Gone};
+  if (eventFailure_) std::rethrow_exception(std::exchange(eventFailure_, nullptr));
+}
+
+const HostObject* Player::live(std::size_t index) const { return Live(static_cast<int>(index)); }
+
+HostObject* Player::Live(int index) const {
+  const ObjectState& target = objects_[static_cast<std::size_t>(index)];
+  return target.state == State::Live ? target.object : nullptr;
+}
+
+int Player::IndexOf(const HostObject* object) const {
+  for (std::size_t i = 0; i < objects_.size(); ++i) {
+    const ObjectState& target = objects_[i];
+    if ((target.state == State::Live || target.state == State::Destroyed) && target.object == object) {
+      return static_cast<int>(i);
+    }
+  }
+  return -1;
+}
+
+void Player::OnEvent(int32_t code) {
+  if (code != kOnSwingCondition || eventFailure_) return;
+  try {
+    // The host asks the library's own condition which rules apply: "On Swing
+    // %0" is true for the chain whose step raised the event.
+    for (const SwingRule& rule : scene_.rules) {
+      if (host_.Condition(kOnSwingCondition, rule.chain) != 0) RunSteps(rule.steps);
+    }
+  } catch (...) {
+    eventFailure_ = std::current_exception();
+  }
+}
+
+void Player::RunSteps(const std::vector<Step>& steps) {
+  for (const Step& step : steps) RunStep(step);
+}
+
+// A step whose object is not on the frame at that moment does nothing, as an
+// event of the host does when no instance of its object exists.
+void Player::RunStep(const Step& step) {
+  switch (step.kind) {
+    case Step::Kind::Action:
+      RunAction(step);
+      return;
+    case Step::Kind::Create:
+      Create(static_cast<std::size_t>(step.object));
+      return;
+    case Step::Kind::Destroy:
+      if (HostObject* object = Live(step.object)) {
+        host_.Destroy(object);
+        objects_[static_cast<std::size_t>(step.object)].state = State::Destroyed;
+      }
+      return;
+    case Step::Kind::MoveTo:
+    case Step::Kind::MoveBy:
+      if (Live(step.object)) Move(objects_[static_cast<std::size_t>(step.object)], step);
+      return;
+  }
+}
+
+void Player::RunAction(const Step& step) {
+  const ActionName& action = kActionNames[step.action];
+  if (action.paramCount > 0 && action.kinds[0] == ParamKind::Object) {
+    HostObject* object = Live(step.object);
+    if (object != nullptr) host_.Action(step.action, reinterpret_cast<intptr_t>(object));
+    return;
+  }
+  // The host evaluates the parameters in order before it calls the routine.
+  const int32_t first = step.values.empty() ? 0 : ToInteger(Evaluate(step.values[0]));
+  const double second = step.values.size() > 1 ? Evaluate(step.values[1]) : 0.0;
+  if (action.paramCount == 2 && action.kinds[1] == ParamKind::Float) {
+    host_.ActionWithValue(step.action, first, RoundToFloat(second));
+  } else {
+    host_.Action(step.action, first, ToInteger(second), RoundToFloat(second));
+  }
+}
+
+void Player::Move(ObjectState& target, const Step& step) {
+  const double x = Evaluate(step.values[0]);
+  const double y = Evaluate(step.values[1]);
+  HostObjectHeader& head = target.object->head;
+  auto place = [&](int32_t& coordinate, double& exact, double value) {
+    // Someone else (the library) moved it since: start from where it is.
+    if (TruncateToInt(exact, coordinate) != coordinate) exact = coordinate;
+    const double next = step.kind == Step::Kind::MoveTo ? value : exact + value;
+    if (!std::isfinite(next)) return;
+    exact = next;
+    coordinate = TruncateToInt(next, coordinate);
+  };
+  place(head.x, target.exactX, x);
+  place(head.y, target.exactY, y);
+  target.object->changed = 1;
+}
+
+double Player::Evaluate(const Value& value) {
+  if (value.expression < 0) return value.number;
+  int32_t params[2] = {0, 0};
+  for (std::size_t i = 0; i < value.params.size() && i < 2; ++i) params[i] = ToInteger(Evaluate(value.params[i]));
+  int32_t result = 0;
+  switch (value.params.size()) {
+    case 0: result = host_.Expression(value.expression); break;
+    case 1: result = host_.Expression(value.expression, {params[0]}); break;
+    default: result = host_.Expression(value.expression, {params[0], params[1]}); break;
+  }
+  return host_.lastResultWasFloat() ? static_cast<double>(std::bit_cast<float>(result)) : static_cast<double>(result);
+}
+
+}  // namespace scene_player

@@ -1,0 +1,67 @@
+// Plays a scene against the library through the stand-in host, as the host
+// would: the scene's objects are host objects, its timeline steps run as the
+// events of their frame, and its "On Swing" rules run inside the event the
+// library raises from each frame's swing step.
+#pragma once
+
+#include <cstdint>
+#include <exception>
+#include <vector>
+
+#include "host.h"
+#include "scene.h"
+
+namespace scene_player {
+
+class Player {
+ public:
+  // Creates the run-time object from the scene's settings and the objects
+  // present at the start. Throws std::runtime_error when the library refuses
+  // the object or lacks a routine that the scene uses.
+  explicit Player(const Scene& scene);
+
+  // Frame `frame` (frames are played in order from 0): the timeline steps of
+  // that frame, then the host's frame, in which the library swings the chains
+  // and raises "On Swing".
+  void PlayFrame(int frame);
+
+  const RunData& extension() const { return *extension_; }
+  // The host object of scene object `index`, or null while it is not on the
+  // frame (not yet created, or destroyed).
+  const HostObject* live(std::size_t index) const;
+  // The scene object that `object` is, or -1. Also finds objects destroyed in
+  // this frame, which the library may still refer to until the next one.
+  int IndexOf(const HostObject* object) const;
+
+ private:
+  enum class State { NotYet, Live, Destroyed, Gone };
+  struct ObjectState {
+    State state = State::NotYet;
+    HostObject* object = nullptr;
+    // The exact position of the last move, so that an object moved by
+    // fractions every frame (a rider moved by "DeltaX(") keeps them instead of
+    // losing up to a pixel to truncation each time.
+    double exactX = 0.0, exactY = 0.0;
+  };
+
+  void CheckRoutines() const;
+  void Create(std::size_t index);
+  void RunSteps(const std::vector<Step>& steps);
+  void RunStep(const Step& step);
+  void RunAction(const Step& step);
+  void Move(ObjectState& target, const Step& step);
+  double Evaluate(const Value& value);
+  void OnEvent(int32_t code);
+  HostObject* Live(int index) const;
+
+  const Scene& scene_;
+  standin::Host host_;
+  const RunData* extension_;
+  std::vector<ObjectState> objects_;
+  std::size_t nextEntry_ = 0;
+  // An exception must not cross the library's swing step: one thrown while
+  // a rule runs is kept here and rethrown once the frame is over.
+  std::exception_ptr eventFailure_;
+};
+
+}  // namespace scene_player
