@@ -5,7 +5,6 @@
 
 #include <windows.h>
 
-#include <array>
 #include <cstdint>
 #include <cstdio>
 #include <cstring>
@@ -29,61 +28,55 @@ inline EditorHost HostWithVersion(uint32_t version) {
   host.slot[kEditorSlotGetVersion] = reinterpret_cast<void*>(&AnswerVersion);
   return host;
 }
+inline EditorHost CompatibleHost() { return HostWithVersion(kCompatibleVersion); }
 
-// A text buffer of Size bytes with guard bytes on both sides, all filled
+// A text buffer of `size` bytes with guard bytes on both sides, all filled
 // with a sentinel so that any byte written shows.
-template <std::size_t Size>
 class GuardedBuffer {
  public:
-  static constexpr unsigned char kSentinel = 0xCD;
+  static constexpr char kSentinel = '\xCD';
   static constexpr std::size_t kGuard = 16;
 
-  GuardedBuffer() { bytes_.fill(kSentinel); }
-  char* data() { return reinterpret_cast<char*>(bytes_.data() + kGuard); }
-  int16_t size() const { return static_cast<int16_t>(Size); }
+  explicit GuardedBuffer(std::size_t size) : size_(size), bytes_(kGuard + size + kGuard, kSentinel) {}
+  char* data() { return bytes_.data() + kGuard; }
+  int16_t size() const { return static_cast<int16_t>(size_); }
 
   // The text up to its terminator; "<no terminator>" when none lies inside.
   std::string text() const {
-    const auto* begin = reinterpret_cast<const char*>(bytes_.data() + kGuard);
-    const void* end = std::memchr(begin, '\0', Size);
-    return end == nullptr ? "<no terminator>" : std::string(begin, static_cast<const char*>(end));
+    const std::string inside = bytes_.substr(kGuard, size_);
+    const std::size_t end = inside.find('\0');
+    return end == std::string::npos ? "<no terminator>" : inside.substr(0, end);
   }
-  bool guardsIntact() const { return AllSentinel(0, kGuard) && AllSentinel(kGuard + Size, kGuard); }
-  bool untouched() const { return AllSentinel(0, bytes_.size()); }
+  bool guardsIntact() const {
+    return bytes_.find_first_not_of(kSentinel) >= kGuard && bytes_.find_last_not_of(kSentinel) + 1 <= kGuard + size_;
+  }
+  bool untouched() const { return bytes_.find_first_not_of(kSentinel) == std::string::npos; }
 
  private:
-  bool AllSentinel(std::size_t from, std::size_t count) const {
-    for (std::size_t i = from; i < from + count; ++i) {
-      if (bytes_[i] != kSentinel) return false;
-    }
-    return true;
-  }
-  std::array<unsigned char, kGuard + Size + kGuard> bytes_;
+  std::size_t size_;
+  std::string bytes_;
 };
 
-// One line per item, read back through the Win32 calls: the quoted text and
-// the command id, " state=0x.." when an item has state bits, and for a
-// popup its submenu's items indented below it.
-inline std::string DumpMenu(HMENU menu, const std::string& indent = "") {
+// The items of a menu read back through the Win32 calls, separated by "|":
+// "text=id", with " state=0x.." when the item has state bits, and for a
+// popup "text{its submenu's items}".
+inline std::string DumpMenu(HMENU menu) {
   std::string dump;
-  const int count = GetMenuItemCount(menu);
-  for (int position = 0; position < count; ++position) {
-    char text[256];
+  for (int position = 0; position < GetMenuItemCount(menu); ++position) {
+    char text[256] = "";
     GetMenuStringA(menu, static_cast<UINT>(position), text, sizeof text, MF_BYPOSITION);
+    dump += (position > 0 ? "|" : "") + std::string(text);
     const UINT id = GetMenuItemID(menu, position);
-    const UINT state = GetMenuState(menu, static_cast<UINT>(position), MF_BYPOSITION);
-    dump += indent + "\"" + text + "\"";
     if (id == 0xFFFFFFFFu) {
-      dump += " popup\n" + DumpMenu(GetSubMenu(menu, position), indent + "  ");
+      dump += "{" + DumpMenu(GetSubMenu(menu, position)) + "}";
       continue;
     }
-    dump += " " + std::to_string(id);
-    if (state != 0) {
+    dump += "=" + std::to_string(id);
+    if (const UINT state = GetMenuState(menu, static_cast<UINT>(position), MF_BYPOSITION); state != 0) {
       char bits[32];
       std::snprintf(bits, sizeof bits, " state=0x%X", state);
       dump += bits;
     }
-    dump += "\n";
   }
   return dump;
 }

@@ -4,23 +4,6 @@
 
 namespace {
 
-TEST(ChainModel, NewChainTakesTheObjectsDefaultsAndRests) {
-  ChainScene scene;
-  HostObject* anchor = scene.Anchor(10, 20);
-  AddChain(scene.rd, anchor);  // the same object may anchor another chain
-  ASSERT_EQ(scene.rd.chains->Count(), 2u);
-  const ChainRecord& chain = scene.Chain(1);
-  EXPECT_EQ(chain.anchor, anchor);
-  EXPECT_EQ(chain.mass, 1.0f);
-  EXPECT_EQ(chain.angle, 90.0f);
-  EXPECT_EQ(chain.linkSpacing, 0.0f);
-  EXPECT_EQ(chain.speed, 0.0f);
-  EXPECT_EQ(chain.acceleration, 0.0f);
-  EXPECT_EQ(chain.platformX, 0.0f);
-  EXPECT_EQ(chain.prevPlatformY, 0.0f);
-  EXPECT_EQ(chain.swinging, 0);
-}
-
 TEST(ChainModel, RemovalKeepsTheOrderOfTheRest) {
   ObjectList list;
   HostObject objects[5] = {};
@@ -34,19 +17,6 @@ TEST(ChainModel, RemovalKeepsTheOrderOfTheRest) {
   list.RemoveAt(2);
   list.Append(&objects[1]);
   EXPECT_EQ(list.At(2), &objects[1]);
-  list.Release();
-  EXPECT_EQ(list.Count(), 0u);
-}
-
-TEST(ChainModel, IndexesOutsideTheListAddressNothing) {
-  ChainScene scene;
-  EXPECT_FALSE(AddressesChain(scene.rd, 0));
-  scene.Anchor(0, 0);
-  EXPECT_TRUE(AddressesChain(scene.rd, 0));
-  EXPECT_FALSE(AddressesChain(scene.rd, 1));
-  EXPECT_FALSE(AddressesChain(scene.rd, -1));
-  EXPECT_FALSE(AddressesChain(scene.rd, INT32_MIN));
-  EXPECT_FALSE(AddressesChain(scene.rd, INT32_MAX));
 }
 
 TEST(ChainModel, LinksAreRegroupedWhenChainsComeAndGo) {
@@ -68,15 +38,6 @@ TEST(ChainModel, LinksAreRegroupedWhenChainsComeAndGo) {
 
   for (int i = 0; i < 9; ++i) scene.Anchor(0, 0);
   EXPECT_EQ(LinksPerChain(scene.rd), 0u);  // eleven chains, ten links
-}
-
-TEST(ChainModel, PlatformsPairWithChainsByPosition) {
-  ChainScene scene;
-  scene.Anchor(0, 0);
-  scene.Anchor(0, 0);
-  HostObject* platform = scene.Platform();
-  EXPECT_EQ(PlatformOfChain(scene.rd, 0), platform);
-  EXPECT_EQ(PlatformOfChain(scene.rd, 1), nullptr);
 }
 
 }  // namespace

@@ -19,9 +19,11 @@ struct ChainScene {
   standin::Host host{Defaults()};
   RunData& rd = host.extension();
 
-  HostObject* Anchor(int32_t x, int32_t y) {
+  // A new chain, resting or swinging, anchored at (x, y).
+  HostObject* Anchor(int32_t x, int32_t y, uint8_t swinging = 0) {
     HostObject* anchor = host.AddObject(x, y, 32);
     AddChain(rd, anchor);
+    rd.chains->At(rd.chains->Count() - 1).swinging = swinging;
     return anchor;
   }
   HostObject* Link(int32_t height) {

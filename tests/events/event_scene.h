@@ -41,27 +41,16 @@ class EventTest : public ::testing::Test {
   // An object parameter is the address of the object's host record.
   static intptr_t Ref(HostObject* object) { return reinterpret_cast<intptr_t>(object); }
 
-  HostObject* Object(int32_t x, int32_t y, int32_t height = 32) {
-    // Distinct identifiers, so a search can only find the object it is given.
-    ++lastId_;
-    return host.AddObject(x, y, height, {static_cast<int16_t>(lastId_), 0});
+  // Adds a new object through the action `code`. Identifiers are distinct,
+  // so a search can only find the object it is given.
+  HostObject* Add(int code, int32_t x, int32_t y, int32_t height = 32) {
+    HostObject* object = host.AddObject(x, y, height, {static_cast<int16_t>(++lastId_), 0});
+    host.Action(code, Ref(object));
+    return object;
   }
-
-  HostObject* AddAnchor(int32_t x, int32_t y) {
-    HostObject* anchor = Object(x, y);
-    host.Action(action::AddAnchor, Ref(anchor));
-    return anchor;
-  }
-  HostObject* AddLink(int32_t x, int32_t y, int32_t height = 32) {
-    HostObject* link = Object(x, y, height);
-    host.Action(action::AddLink, Ref(link));
-    return link;
-  }
-  HostObject* AddPlatform(int32_t x, int32_t y) {
-    HostObject* platform = Object(x, y);
-    host.Action(action::AddPlatform, Ref(platform));
-    return platform;
-  }
+  HostObject* AddAnchor(int32_t x, int32_t y) { return Add(action::AddAnchor, x, y); }
+  HostObject* AddLink(int32_t x, int32_t y, int32_t height = 32) { return Add(action::AddLink, x, y, height); }
+  HostObject* AddPlatform(int32_t x, int32_t y) { return Add(action::AddPlatform, x, y); }
 
   const ChainRecord& Chain(uint32_t index) { return host.extension().chains->At(index); }
 

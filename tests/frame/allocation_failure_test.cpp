@@ -33,10 +33,15 @@ void operator delete(void* p, std::size_t) noexcept { std::free(p); }
 
 namespace {
 
-struct FailAfter {
-  explicit FailAfter(int allocations) { g_allocationsBeforeFailure = allocations; }
-  ~FailAfter() { g_allocationsBeforeFailure = -1; }
-};
+// Runs `call` with every allocation after the first `succeeding` failing.
+template <typename Call>
+auto FailingAfter(int succeeding, Call call) {
+  struct Restore {
+    ~Restore() { g_allocationsBeforeFailure = -1; }
+  } restore;
+  g_allocationsBeforeFailure = succeeding;
+  return call();
+}
 
 TEST(AllocationFailure, CreationIsRefusedWholeWhenAnyListCannotBeMade) {
   EditData edit{};
@@ -44,12 +49,7 @@ TEST(AllocationFailure, CreationIsRefusedWholeWhenAnyListCannotBeMade) {
   for (int succeeding = 0; succeeding < 3; ++succeeding) {
     alignas(8) unsigned char storage[sizeof(RunData)] = {};
     auto* rd = reinterpret_cast<RunData*>(storage);
-    int16_t result;
-    {
-      FailAfter fail(succeeding);
-      result = CreateRunObject(rd, &edit, nullptr);
-    }
-    EXPECT_EQ(result, -1) << succeeding << " allocations succeeded";
+    EXPECT_EQ(FailingAfter(succeeding, [&] { return CreateRunObject(rd, &edit, nullptr); }), -1) << succeeding;
     EXPECT_EQ(rd->links, nullptr);
     EXPECT_EQ(rd->platforms, nullptr);
     EXPECT_EQ(rd->chains, nullptr);
@@ -64,24 +64,14 @@ TEST(AllocationFailure, AFailedAppendLeavesTheListAsItWas) {
   HostObject a{}, b{}, c{};
   ASSERT_TRUE(list.Append(&a));
   ASSERT_TRUE(list.Append(&b));
-  bool appended = true;
-  {
-    FailAfter fail(0);
-    // Two elements fill a vector's storage of two, so the third must grow it.
-    appended = list.Append(&c);
-  }
-  EXPECT_FALSE(appended);
+  // Two elements fill a vector's storage of two, so the third must grow it.
+  EXPECT_FALSE(FailingAfter(0, [&] { return list.Append(&c); }));
   ASSERT_EQ(list.Count(), 2u);
   EXPECT_EQ(list.At(0), &a);
   EXPECT_EQ(list.At(1), &b);
 
   ChainList chains;
-  bool added = true;
-  {
-    FailAfter fail(0);
-    added = chains.Append(ChainRecord{});
-  }
-  EXPECT_FALSE(added);
+  EXPECT_FALSE(FailingAfter(0, [&] { return chains.Append(ChainRecord{}); }));
   EXPECT_EQ(chains.Count(), 0u);
 }
 

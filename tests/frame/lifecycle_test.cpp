@@ -1,108 +1,98 @@
+// The entry points the host calls over the object's life, and the records
+// it shares with them: sizes and offsets are asserted at compile time in the
+// headers, these check what the host sees at run time.
 #include <cmath>
 #include <cstring>
+#include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
 
 #include "chains/run_data.h"
 #include "frame/edit_data.h"
 #include "frame/exports.h"
+#include "frame/host_object.h"
 #include "frame/run_info.h"
 #include "host.h"
 
 namespace {
 
-EditData Defaults() {
-  EditData edit{};
-  WriteEditDataDefaults(edit);
-  return edit;
-}
-
-void SetField(char (&field)[kSettingTextSize], const char* text) {
-  std::memset(field, 0, sizeof field);
-  std::memcpy(field, text, std::strlen(text));
-}
-
 TEST(GetInfos, AnswersTheInterfaceQueries) {
-  EXPECT_EQ(GetInfos(0), 0x300u);
-  EXPECT_EQ(GetInfos(2), 0x100u);
-  EXPECT_EQ(GetInfos(1), 0u);
-  EXPECT_EQ(GetInfos(3), 0u);
-  EXPECT_EQ(GetInfos(-1), 0u);
+  const std::pair<int32_t, uint32_t> answers[] = {{0, 0x300u}, {2, 0x100u}, {1, 0u}, {3, 0u}, {-1, 0u}};
+  for (const auto& [query, answer] : answers) EXPECT_EQ(GetInfos(query), answer) << query;
 }
 
 TEST(RunInfoRecord, DescribesTheExtension) {
   RunInfo info;
   std::memset(&info, 0xAB, sizeof info);
   EXPECT_EQ(GetRunObjectInfos(nullptr, &info), 1);
-  EXPECT_EQ(info.conditionCount, 2);
-  EXPECT_EQ(info.actionCount, 16);
-  EXPECT_EQ(info.expressionCount, 17);
-  EXPECT_EQ(info.editDataSize, 100);
-  EXPECT_EQ(info.objectFlags, 0);
-  EXPECT_EQ(info.priority, 100);
-  EXPECT_EQ(info.editorOptions, 0);
-  EXPECT_EQ(info.identifier, 0x5456524Eu);
-  EXPECT_EQ(info.version, 1);
-  EXPECT_EQ(info.conditionRoutines[info.conditionCount], nullptr);
-  EXPECT_EQ(info.actionRoutines[info.actionCount], nullptr);
-  EXPECT_EQ(info.expressionRoutines[info.expressionCount], nullptr);
+  // Conditions, actions, expressions, edit data size, flags, priority, editor options, version.
+  EXPECT_EQ((std::vector<int>{info.conditionCount, info.actionCount, info.expressionCount, info.editDataSize,
+                              info.objectFlags, info.priority, info.editorOptions, info.version}),
+            (std::vector<int>{2, 16, 17, 100, 0, 100, 0, 1}));
+  // The identifier's bytes hold its characters last to first.
+  EXPECT_EQ(std::string(reinterpret_cast<const char*>(&info.identifier), 4), "NRVT");
+  // The tables themselves, null-terminated, are checked at compile time.
+  EXPECT_TRUE(info.conditionRoutines == kConditionRoutines && info.actionRoutines == kActionRoutines &&
+              info.expressionRoutines == kExpressionRoutines);
 }
 
-TEST(CreateRunObject, ConvertsTheDefaultSettings) {
-  standin::Host host(Defaults());
-  ASSERT_TRUE(host.created());
-  RunData& rd = host.extension();
-  EXPECT_EQ(rd.startAngle, 90.0f);
-  EXPECT_EQ(rd.defaultMass, 1.0f);
-  EXPECT_EQ(rd.gravity, 9.81f);
-  EXPECT_EQ(rd.defaultLinkSpacing, 0.0f);
-  ASSERT_NE(rd.links, nullptr);
-  ASSERT_NE(rd.platforms, nullptr);
-  ASSERT_NE(rd.chains, nullptr);
-  EXPECT_EQ(rd.links->Count(), 0u);
-  EXPECT_EQ(rd.platforms->Count(), 0u);
-  EXPECT_EQ(rd.chains->Count(), 0u);
+TEST(Layout, RunDataSizeIsWhatTheHostAllocates) {
+  EXPECT_EQ(GetRunObjectDataSize(nullptr, nullptr), sizeof(void*) == 8 ? 232u : 216u);
 }
 
-TEST(CreateRunObject, ReadsEachTextIntoItsOwnSetting) {
-  EditData edit = Defaults();
-  SetField(edit.startAngleText, " 45abc");
-  SetField(edit.massText, "1e2");
-  SetField(edit.gravityText, "9,81");
-  SetField(edit.linkSpacingText, "-2.5");
-  standin::Host host(edit);
-  RunData& rd = host.extension();
-  EXPECT_EQ(rd.startAngle, 45.0f);
-  EXPECT_EQ(rd.defaultMass, 100.0f);
-  EXPECT_EQ(rd.gravity, 9.0f);
-  EXPECT_EQ(rd.defaultLinkSpacing, -2.5f);
+TEST(Layout, ObjectIdentifierSignExtendsTheLowHalf) {
+  const struct {
+    uint16_t high;
+    int16_t low;
+    int32_t id;
+  } cases[] = {{1, -1, 65535}, {0, -1, -1}, {0xFFFF, -32768, static_cast<int32_t>(0xFFFF0000u - 32768u)},
+               {2, 5, 0x20005}};
+  for (const auto& c : cases) {
+    HostObjectHeader object{};
+    object.idHigh = c.high;
+    object.idLow = c.low;
+    EXPECT_EQ(ObjectIdentifier(object), c.id) << c.high << ", " << c.low;
+  }
 }
 
-TEST(CreateRunObject, ReadsAnUnterminatedTextNoFurtherThanItsField) {
-  EditData edit = Defaults();
-  std::memcpy(edit.startAngleText, "1234567890", 10);  // no terminator
-  SetField(edit.massText, "5");
-  standin::Host host(edit);
-  EXPECT_EQ(host.extension().startAngle, 1234567890.0f);
-  EXPECT_EQ(host.extension().defaultMass, 5.0f);
+// Each text goes into its own setting: an unterminated one is read to the end
+// of its field only, and a value beyond the float range is infinite.
+TEST(CreateRunObject, ConvertsEachSettingTextForTheChainsToCome) {
+  const struct {
+    const char* texts[4];  // start angle, mass, gravity, link spacing; null: the default
+    float values[4];
+  } cases[] = {{{nullptr, nullptr, nullptr, nullptr}, {90.0f, 1.0f, 9.81f, 0.0f}},
+               {{" 45abc", "1e2", "9,81", "-2.5"}, {45.0f, 100.0f, 9.0f, -2.5f}},
+               {{"1234567890", "9e99", "1e999", "   "}, {1234567890.0f, INFINITY, INFINITY, 0.0f}}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.values[0]);
+    EditData edit{};
+    WriteEditDataDefaults(edit);
+    char* fields[] = {edit.startAngleText, edit.massText, edit.gravityText, edit.linkSpacingText};
+    for (int i = 0; i < 4; ++i) {
+      // Ten characters fill a field without a terminator.
+      if (c.texts[i] != nullptr) std::strncpy(fields[i], c.texts[i], kSettingTextSize);
+    }
+    standin::Host host(edit);
+    ASSERT_TRUE(host.created());
+    const RunData& rd = host.extension();
+    EXPECT_EQ((std::vector<float>{rd.startAngle, rd.defaultMass, rd.gravity, rd.defaultLinkSpacing}),
+              (std::vector<float>(c.values, c.values + 4)));
+    EXPECT_EQ(rd.currentChain, -1);  // no chain has swung yet
+    EXPECT_EQ(rd.links->Count() + rd.platforms->Count() + rd.chains->Count(), 0u);
+    // A new chain starts from the settings, at rest.
+    ASSERT_TRUE(AddChain(host.extension(), host.AddObject(0, 0, 32)));
+    const ChainRecord& chain = rd.chains->At(0);
+    EXPECT_EQ((std::vector<float>{chain.angle, chain.mass, chain.linkSpacing, chain.speed, chain.acceleration}),
+              (std::vector<float>{c.values[0], c.values[1], c.values[3], 0.0f, 0.0f}));
+    EXPECT_EQ(chain.swinging, 0);
+  }
 }
 
-TEST(CreateRunObject, AnOverflowingGravityIsInfinite) {
-  EditData edit = Defaults();
-  SetField(edit.gravityText, "1e999");
-  SetField(edit.massText, "9e99");  // beyond float: rounds to infinity
-  standin::Host host(edit);
-  EXPECT_EQ(host.extension().gravity, INFINITY);
-  EXPECT_EQ(host.extension().defaultMass, INFINITY);
-}
-
-TEST(CreateRunObject, NoChainHasSwungYet) {
-  standin::Host host(Defaults());
-  EXPECT_EQ(host.extension().currentChain, -1);
-}
-
-TEST(DestroyRunObject, ReleasesEmptyListsAndToleratesMissingOnes) {
-  EditData edit = Defaults();
+TEST(DestroyRunObject, ReleasesTheListsAndToleratesMissingOnes) {
+  EditData edit{};
+  WriteEditDataDefaults(edit);
   alignas(8) unsigned char storage[sizeof(RunData)] = {};
   auto* rd = reinterpret_cast<RunData*>(storage);
   ASSERT_EQ(CreateRunObject(rd, &edit, nullptr), 0);
@@ -110,24 +100,8 @@ TEST(DestroyRunObject, ReleasesEmptyListsAndToleratesMissingOnes) {
   EXPECT_EQ(rd->links, nullptr);
   EXPECT_EQ(rd->platforms, nullptr);
   EXPECT_EQ(rd->chains, nullptr);
-  // A second destruction finds no list and does nothing.
-  EXPECT_EQ(DestroyRunObject(rd, 0), 0);
-  // A frame on an object without lists changes nothing.
-  EXPECT_EQ(HandleRunObject(rd), 0);
-}
-
-TEST(RunTimeRoutines, DoNothingButAnswerZero) {
-  standin::Host host(Defaults());
-  RunData* rd = &host.extension();
-  EXPECT_EQ(DisplayRunObject(rd), 0);
-  EXPECT_EQ(PauseRunObject(rd), 0);
-  EXPECT_EQ(ContinueRunObject(rd), 0);
-  EXPECT_EQ(HandleRunObject(rd), 0);
-  EXPECT_EQ(Initialize(nullptr, 0), 0);
-  EXPECT_EQ(Free(nullptr), 0);
-  EXPECT_EQ(LoadObject(nullptr, nullptr, nullptr, 0), 0);
-  EXPECT_EQ(UpdateEditStructure(nullptr, nullptr), 0);
-  EXPECT_EQ(UsesFile(nullptr, nullptr), 0);
+  EXPECT_EQ(DestroyRunObject(rd, 0), 0);  // a second destruction finds nothing to do
+  EXPECT_EQ(HandleRunObject(rd), 0);      // a frame without lists changes nothing
 }
 
 }  // namespace

@@ -7,54 +7,30 @@
 
 namespace {
 
-double Parse(const char* text) { return ParseDecimalPrefix(text, std::strlen(text) + 1); }
-
-TEST(SettingText, ReadsTheLongestDecimalPrefix) {
-  EXPECT_EQ(Parse("90"), 90.0);
-  EXPECT_EQ(Parse("9.81"), 9.81);
-  EXPECT_EQ(Parse(" 45abc"), 45.0);
-  EXPECT_EQ(Parse("\t-2.5x"), -2.5);
-  EXPECT_EQ(Parse("+3"), 3.0);
-  EXPECT_EQ(Parse(".5"), 0.5);
-  EXPECT_EQ(Parse("5."), 5.0);
-  EXPECT_EQ(Parse("1e2"), 100.0);
-  EXPECT_EQ(Parse("2.5E-1"), 0.25);
-}
-
-TEST(SettingText, StopsBeforeAnIncompleteExponent) {
-  EXPECT_EQ(Parse("1e"), 1.0);
-  EXPECT_EQ(Parse("1e+"), 1.0);
-  EXPECT_EQ(Parse("7E-x"), 7.0);
-}
-
-TEST(SettingText, GivesZeroWhenThereIsNoNumber) {
-  EXPECT_EQ(Parse(""), 0.0);
-  EXPECT_EQ(Parse("abc"), 0.0);
-  EXPECT_EQ(Parse("-"), 0.0);
-  EXPECT_EQ(Parse("."), 0.0);
-  EXPECT_EQ(Parse("e5"), 0.0);
-}
-
-TEST(SettingText, AcceptsOnlyDecimalNotationWithAPoint) {
-  EXPECT_EQ(Parse("9,81"), 9.0);  // a decimal comma ends the number
-  EXPECT_EQ(Parse("0x10"), 0.0);  // no hexadecimal
-  EXPECT_EQ(Parse("inf"), 0.0);
-  EXPECT_EQ(Parse("nan"), 0.0);
-  EXPECT_EQ(Parse("-infinity"), 0.0);
-}
-
-TEST(SettingText, OverflowIsInfiniteAndUnderflowIsZero) {
-  EXPECT_EQ(Parse("1e999"), INFINITY);
-  EXPECT_EQ(Parse("-1e999"), -INFINITY);
-  EXPECT_EQ(Parse("1e-999"), 0.0);
+TEST(SettingText, ReadsTheLongestDecimalPrefixAndNothingElse) {
+  const struct {
+    const char* text;
+    double value;
+  } cases[] = {
+      {"90", 90.0}, {"9.81", 9.81}, {" 45abc", 45.0}, {"\t-2.5x", -2.5}, {"+3", 3.0}, {".5", 0.5},
+      {"5.", 5.0}, {"1e2", 100.0}, {"2.5E-1", 0.25},
+      // An incomplete exponent is not part of the number.
+      {"1e", 1.0}, {"1e+", 1.0}, {"7E-x", 7.0},
+      // No number at all.
+      {"", 0.0}, {"   ", 0.0}, {"abc", 0.0}, {"-", 0.0}, {".", 0.0}, {"e5", 0.0},
+      // Decimal notation with a point only: a comma ends the number.
+      {"9,81", 9.0}, {"0x10", 0.0}, {"inf", 0.0}, {"nan", 0.0}, {"-infinity", 0.0},
+      {"1e999", INFINITY}, {"-1e999", -INFINITY}, {"1e-999", 0.0},
+  };
+  for (const auto& c : cases) {
+    EXPECT_EQ(ParseDecimalPrefix(c.text, std::strlen(c.text) + 1), c.value) << '"' << c.text << '"';
+  }
 }
 
 TEST(SettingText, NeverReadsPastTheFieldWhenTheTerminatorIsMissing) {
-  // Ten digits and no terminator, then what would be the next field.
-  const char bytes[] = {'1', '2', '3', '4', '5', '6', '7', '8', '9', '0', '7', '7', '\0'};
-  EXPECT_EQ(ParseDecimalPrefix(bytes, 10), 1234567890.0);
-  const char exponent[] = {' ', ' ', ' ', ' ', ' ', ' ', ' ', ' ', '1', 'e', '5', '\0'};
-  EXPECT_EQ(ParseDecimalPrefix(exponent, 10), 1.0);
+  // Ten bytes without a terminator, then what would be the next field.
+  EXPECT_EQ(ParseDecimalPrefix("123456789077", 10), 1234567890.0);
+  EXPECT_EQ(ParseDecimalPrefix("        1e5", 10), 1.0);
 }
 
 }  // namespace

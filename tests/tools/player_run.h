@@ -2,10 +2,64 @@
 // it printed and the status it ended with.
 #pragma once
 
+#include <sys/wait.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace player_test {
+
+inline std::string ReadFile(const std::string& path) {
+  std::ifstream file(path, std::ios::binary);
+  std::ostringstream text;
+  text << file.rdbuf();
+  return text.str();
+}
+
+inline std::vector<std::string> Lines(const std::string& text) {
+  std::vector<std::string> lines;
+  std::istringstream stream(text);
+  for (std::string line; std::getline(stream, line);) lines.push_back(line);
+  return lines;
+}
+
+// A fresh temporary folder, removed with everything in it at the end.
+class Folder {
+ public:
+  Folder() {
+    std::string pattern = (std::filesystem::temp_directory_path() / "scene_player_test.XXXXXX").string();
+    if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("cannot make a temporary folder");
+    path_ = pattern;
+  }
+  ~Folder() {
+    std::error_code ignored;
+    std::filesystem::remove_all(path_, ignored);
+  }
+  Folder(const Folder&) = delete;
+  Folder& operator=(const Folder&) = delete;
+
+  const std::string& path() const { return path_; }
+  std::string operator/(const std::string& name) const { return path_ + "/" + name; }
+  void Write(const std::string& name, const std::string& text) const {
+    std::ofstream(*this / name, std::ios::binary) << text;
+  }
+  // The names of the files in the folder, sorted.
+  std::vector<std::string> Files() const {
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(path_)) names.push_back(entry.path().filename());
+    std::sort(names.begin(), names.end());
+    return names;
+  }
+
+ private:
+  std::string path_;
+};
 
 struct PlayerRun {
   int status = -1;  // exit status; -1 when it did not exit normally
@@ -13,29 +67,20 @@ struct PlayerRun {
   std::string err;  // standard error
 };
 
-// A fresh temporary folder, removed with everything in it at the end.
-class Folder {
- public:
-  Folder();
-  ~Folder();
-  Folder(const Folder&) = delete;
-  Folder& operator=(const Folder&) = delete;
-
-  const std::string& path() const { return path_; }
-  std::string operator/(const std::string& name) const { return path_ + "/" + name; }
-  // Writes `text` to the file `name` in the folder and gives its path.
-  std::string Write(const std::string& name, const std::string& text) const;
-  // The names of the files in the folder, sorted.
-  std::vector<std::string> Files() const;
-
- private:
-  std::string path_;
-};
-
-// Runs the player with `args`, its working folder being `folder`.
-PlayerRun RunPlayer(const std::vector<std::string>& args, const Folder& folder);
-
-std::string ReadFile(const std::string& path);
-std::vector<std::string> Lines(const std::string& text);
+// Runs the player with `args` in `folder`. What it prints goes to a folder of
+// its own, so that the files it leaves in `folder` are only its own.
+inline PlayerRun RunPlayer(const std::vector<std::string>& args, const Folder& folder) {
+  const auto quoted = [](const std::string& word) { return "'" + word + "'"; };
+  Folder captured;
+  std::string command = "cd " + quoted(folder.path()) + " && exec " + quoted(SCENE_PLAYER);
+  for (const std::string& arg : args) command += " " + quoted(arg);
+  command += " >" + quoted(captured / "out") + " 2>" + quoted(captured / "err");
+  const int status = std::system(command.c_str());
+  PlayerRun run;
+  if (status != -1 && WIFEXITED(status)) run.status = WEXITSTATUS(status);
+  run.out = ReadFile(captured / "out");
+  run.err = ReadFile(captured / "err");
+  return run;
+}
 
 }  // namespace player_test

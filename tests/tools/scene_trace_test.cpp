@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <map>
 #include <nlohmann/json.hpp>
 
 #include "player_run.h"
@@ -28,30 +29,21 @@ constexpr const char* kScene = R"({
     {"name": "link2", "x": 0, "y": 0, "width": 8, "height": 32},
     {"name": "link3", "x": 0, "y": 0, "width": 8, "height": 32},
     {"name": "platform", "x": 0, "y": 0, "width": 40, "height": 10},
-    {"name": "rider", "x": 7, "y": -3, "width": 10, "height": 20}
-  ],
-  "timeline": [
-    {"frame": 0, "do": [
-      {"action": "Add Anchor", "params": ["anchor"]},
-      {"action": "Add Link", "params": ["link1"]},
-      {"action": "Add Link  %0", "params": ["link2"]},
-      {"action": "Add Link", "params": ["link3"]},
-      {"action": "Add Platform", "params": ["platform"]},
-      {"action": "Set Angle", "params": [0, 30.5]},
-      {"action": "Start Chain", "params": [0]}
-    ]}
-  ],
-  "onSwing": [
-    {"chain": 0, "do": [{"move": "rider", "by": [
-      {"expression": "DeltaX(", "params": [0]}, {"expression": "DeltaY(", "params": [0]}]}]}
-  ]
+    {"name": "rider", "x": 7, "y": -3, "width": 10, "height": 20}],
+  "timeline": [{"frame": 0, "do": [
+    {"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Link", "params": ["link1"]},
+    {"action": "Add Link  %0", "params": ["link2"]}, {"action": "Add Link", "params": ["link3"]},
+    {"action": "Add Platform", "params": ["platform"]}, {"action": "Set Angle", "params": [0, 30.5]},
+    {"action": "Start Chain", "params": [0]}]}],
+  "onSwing": [{"chain": 0, "do": [{"move": "rider", "by": [
+    {"expression": "DeltaX(", "params": [0]}, {"expression": "DeltaY(", "params": [0]}]}]}]
 })";
 
 struct Expected {
   float angle = 30.5f, speed = 0.0f, acceleration = 0.0f;
   float platformX = 0.0f, platformY = 0.0f, prevPlatformX = 0.0f, prevPlatformY = 0.0f;
-  int32_t linkX[3] = {}, linkY[3] = {};
   double riderX = 7.0, riderY = -3.0;
+  std::map<std::string, std::pair<int32_t, int32_t>> objects;  // where each object stands
 };
 
 // One swing step of the scene's chain.
@@ -73,19 +65,18 @@ void Step(Expected& e) {
   e.platformY = static_cast<float>(std::sin(theta) * length + anchorY);
   for (int k = 1; k <= links; ++k) {
     const double distance = (height + spacing) * static_cast<double>(static_cast<float>(k));
-    e.linkX[k - 1] = static_cast<int32_t>(std::trunc(std::cos(theta) * distance + anchorX));
-    e.linkY[k - 1] = static_cast<int32_t>(std::trunc(std::sin(theta) * distance + anchorY));
+    e.objects["link" + std::to_string(k)] = {static_cast<int32_t>(std::cos(theta) * distance + anchorX),
+                                             static_cast<int32_t>(std::sin(theta) * distance + anchorY)};
   }
-  // The rule adds the platform's move, a float difference of floats.
+  // The rule adds the platform's move, a float difference of floats. The
+  // rider keeps the fractions of its moves: it is where the sum of the deltas
+  // puts it, truncated once.
   e.riderX += static_cast<float>(static_cast<double>(e.platformX) - e.prevPlatformX);
   e.riderY += static_cast<float>(static_cast<double>(e.platformY) - e.prevPlatformY);
-}
-
-const json& ObjectNamed(const json& line, const std::string& name) {
-  for (const json& object : line["objects"]) {
-    if (object["name"] == name) return object;
-  }
-  throw std::runtime_error("no object " + name + " in the trace");
+  e.objects["anchor"] = {100, 50};
+  const auto at = [](double x, double y) { return std::make_pair(static_cast<int32_t>(x), static_cast<int32_t>(y)); };
+  e.objects["platform"] = at(e.platformX, e.platformY);  // truncated toward zero
+  e.objects["rider"] = at(e.riderX, e.riderY);
 }
 
 TEST(SceneTraceTest, ChainAndRiderFollowThePendulumFrameByFrame) {
@@ -108,62 +99,57 @@ TEST(SceneTraceTest, ChainAndRiderFollowThePendulumFrameByFrame) {
     const json& chain = line["chains"][0];
     EXPECT_EQ(chain["anchor"], "anchor");
     EXPECT_EQ(chain["swinging"], 1);
-    EXPECT_EQ(chain["mass"].get<double>(), 1.0);
-    EXPECT_EQ(chain["linkSpacing"].get<double>(), 0.0);
     // Exact: the trace holds the float values themselves.
-    EXPECT_EQ(chain["angle"].get<double>(), e.angle);
-    EXPECT_EQ(chain["speed"].get<double>(), e.speed);
-    EXPECT_EQ(chain["acceleration"].get<double>(), e.acceleration);
-    EXPECT_EQ(chain["platformX"].get<double>(), e.platformX);
-    EXPECT_EQ(chain["platformY"].get<double>(), e.platformY);
-    EXPECT_EQ(chain["prevPlatformX"].get<double>(), e.prevPlatformX);
-    EXPECT_EQ(chain["prevPlatformY"].get<double>(), e.prevPlatformY);
-    for (int k = 0; k < 3; ++k) {
-      const json& link = ObjectNamed(line, "link" + std::to_string(k + 1));
-      EXPECT_EQ(link["x"], e.linkX[k]) << "link " << k + 1;
-      EXPECT_EQ(link["y"], e.linkY[k]) << "link " << k + 1;
+    const std::pair<const char*, float> values[] = {
+        {"mass", 1.0f}, {"linkSpacing", 0.0f}, {"angle", e.angle}, {"speed", e.speed},
+        {"acceleration", e.acceleration}, {"platformX", e.platformX}, {"platformY", e.platformY},
+        {"prevPlatformX", e.prevPlatformX}, {"prevPlatformY", e.prevPlatformY}};
+    for (const auto& [name, value] : values) EXPECT_EQ(chain[name].get<double>(), value) << name;
+    ASSERT_EQ(line["objects"].size(), e.objects.size());
+    for (const json& object : line["objects"]) {
+      const auto position = std::make_pair(object["x"].get<int32_t>(), object["y"].get<int32_t>());
+      EXPECT_EQ(position, e.objects.at(object["name"].get<std::string>())) << object["name"];
     }
-    const json& platform = ObjectNamed(line, "platform");
-    EXPECT_EQ(platform["x"], static_cast<int32_t>(std::trunc(e.platformX)));
-    EXPECT_EQ(platform["y"], static_cast<int32_t>(std::trunc(e.platformY)));
-    // The rider keeps the fractions of its moves: it is where the sum of the
-    // deltas puts it, truncated once.
-    const json& rider = ObjectNamed(line, "rider");
-    EXPECT_EQ(rider["x"], static_cast<int32_t>(std::trunc(e.riderX)));
-    EXPECT_EQ(rider["y"], static_cast<int32_t>(std::trunc(e.riderY)));
-    EXPECT_EQ(ObjectNamed(line, "anchor")["x"], 100);
   }
-  // The chain swings back from 30.5 degrees towards the vertical.
-  EXPECT_LT(e.angle, 30.5f);
+  EXPECT_LT(e.angle, 30.5f);  // the chain swings back towards the vertical
 }
 
-// The swing step does not turn objects; an update does, by the chain's angle.
-TEST(SceneTraceTest, UpdateChainTurnsLinksAndPlatform) {
+// Actions named by menu or display text reach the routines they name: each
+// value lands where its action puts it, the second chain alone swings, and
+// only chain 0's objects are turned by "Update Chain" (to 90 - 45.75 degrees:
+// 3 of 32 steps; chain 1's, at angle 0, would face 8).
+TEST(SceneTraceTest, ActionsReachTheRoutinesTheyName) {
   Folder folder;
-  folder.Write("update.json", R"({
-    "frames": 1,
-    "objects": [
-      {"name": "anchor", "x": 100, "y": 100, "width": 16, "height": 16},
-      {"name": "link", "x": 0, "y": 0, "width": 8, "height": 10},
-      {"name": "platform", "x": 0, "y": 0, "width": 40, "height": 10}
-    ],
-    "timeline": [{"frame": 0, "do": [
-      {"action": "Add Anchor", "params": ["anchor"]},
-      {"action": "Add Link", "params": ["link"]},
-      {"action": "Add Platform", "params": ["platform"]},
-      {"action": "Set Angle at index %0 to %1", "params": [0, 45]},
-      {"action": "Update Chain", "params": [0]}
-    ]}]
-  })");
-  const PlayerRun run = RunPlayer({"update.json", "--trace", "update.jsonl"}, folder);
+  folder.Write("actions.json", R"({"frames": 1, "objects": [
+    {"name": "anchor", "x": 0, "y": 0, "width": 16, "height": 16},
+    {"name": "anchor2", "x": 300, "y": 0, "width": 16, "height": 16},
+    {"name": "link", "x": 0, "y": 0, "width": 8, "height": 10},
+    {"name": "link2", "x": 0, "y": 0, "width": 8, "height": 10},
+    {"name": "platform", "x": 0, "y": 0, "width": 40, "height": 10}],
+  "timeline": [{"frame": 0, "do": [
+    {"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Anchor", "params": ["anchor2"]},
+    {"action": "Add Link", "params": ["link"]}, {"action": "Add Link", "params": ["link2"]},
+    {"action": "Add Platform", "params": ["platform"]}, {"action": "Set Anchor X", "params": [0, 150]},
+    {"action": "Set Anchor Y", "params": [0, 120]}, {"action": "Set Mass", "params": [0, 2.5]},
+    {"action": "Set Speed at index %0 to %1", "params": [0, 0.5]}, {"action": "Set Link Spacing", "params": [0, 1.5]},
+    {"action": "Set Acceleration", "params": [0, 0.25]}, {"action": "Set Angle at index %0 to %1", "params": [0, 45]},
+    {"action": "Set Angle", "params": [1, 0]}, {"action": "Start All"},
+    {"action": "Stop Chain", "params": [0]}, {"action": "Update Chain", "params": [0]}]}]})");
+  const PlayerRun run = RunPlayer({"actions.json", "--trace", "actions.jsonl"}, folder);
   ASSERT_EQ(run.status, 0) << run.err;
-  const json line = json::parse(Lines(ReadFile(folder / "update.jsonl")).at(0));
-  // 90 - 45 = 45 degrees; 45 * 32 / 360 = 4 direction steps.
-  EXPECT_EQ(ObjectNamed(line, "link")["direction"], 4);
-  EXPECT_EQ(ObjectNamed(line, "platform")["direction"], 4);
-  EXPECT_EQ(ObjectNamed(line, "anchor")["direction"], 0);
-  EXPECT_EQ(line["chains"][0]["swinging"], 0);
-  EXPECT_EQ(line["currentChain"], -1);  // an update raises no "On Swing"
+  const json line = json::parse(ReadFile(folder / "actions.jsonl"));
+  EXPECT_EQ(line["currentChain"], 1);
+  const json& chain = line["chains"].at(0);
+  EXPECT_EQ(chain["swinging"], 0);
+  EXPECT_EQ(line["chains"].at(1)["swinging"], 1);
+  const std::pair<const char*, double> values[] = {
+      {"mass", 2.5}, {"linkSpacing", 1.5}, {"speed", 0.75}, {"angle", 45.75}};
+  for (const auto& [name, value] : values) EXPECT_EQ(chain[name].get<double>(), value) << name;
+  const json& objects = line["objects"];  // anchor, anchor2, link, link2, platform
+  EXPECT_EQ(objects.at(0)["x"], 150);
+  EXPECT_EQ(objects.at(0)["y"], 120);
+  const int directions[] = {0, 0, 3, 0, 3};
+  for (int i = 0; i < 5; ++i) EXPECT_EQ(objects.at(i)["direction"], directions[i]) << objects.at(i)["name"];
 }
 
 }  // namespace
