@@ -41,6 +41,7 @@ bool CopyMenuItems(HMENU source, HMENU destination) {
       copied = AppendMenuA(destination, MF_SEPARATOR, 0, nullptr) != FALSE;
       continue;
     }
+    text[0] = '\0';  // an item whose text cannot be read gets none, not the last item's
     ReadMenuText(source, static_cast<UINT>(position), text, kScratchSize, MF_BYPOSITION);
     if (id == 0xFFFFFFFFu) {  // the item opens a submenu
       copied = CopySubmenu(source, position, destination, text);
