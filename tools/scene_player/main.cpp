@@ -1,96 +1,39 @@
 // scene_player: plays a scene against the library, as the host would, and
-// writes what happened as an animated GIF, optionally one frame as a PNG and
-// a per-frame trace.
+// writes what happened as an animated GIF, optionally frames as PNG pictures
+// and a per-frame trace.
+#include <algorithm>
 #include <cerrno>
-#include <cstdlib>
-#include <cstring>
 #include <cstdio>
+#include <cstring>
 #include <iostream>
+#include <memory>
 #include <optional>
 #include <string>
 #include <unistd.h>
+#include <vector>
 
 #include "demo_scene.h"
 #include "frame_renderer.h"
 #include "gif_writer.h"
+#include "options.h"
 #include "output_file.h"
+#include "output_paths.h"
 #include "palette.h"
+#include "partial_files.h"
 #include "player.h"
 #include "png_writer.h"
 #include "scene_parser.h"
 #include "trace_writer.h"
+#include "warnings.h"
 
 namespace {
 
 using namespace scene_player;
 
-constexpr int kBadInput = 2;
+// Exit statuses: 0 played and written; 1 a failure while playing or
+// writing; 2 bad input (the command line or the scene).
 constexpr int kFailed = 1;
-
-constexpr const char* kUsage =
-    "usage: scene_player [SCENE.json] [--gif FILE] [--png FILE [--png-frame N]] [--trace FILE]\n"
-    "       scene_player --print-demo\n"
-    "Plays SCENE.json, or the embedded demo scene without one, and writes an animated GIF\n"
-    "(by default SCENE.gif in the current folder, demo.gif for the demo). --png writes one\n"
-    "frame (by default the last; frames count from 0), --trace a JSON line per frame.\n"
-    "--print-demo prints the demo scene, a starting point for a scene of your own.\n";
-
-struct Options {
-  std::string scene;  // empty: the embedded demo
-  std::string gif, png, trace;
-  std::optional<long> pngFrame;
-  bool printDemo = false;
-};
-
-class UsageError : public std::runtime_error {
-  using std::runtime_error::runtime_error;
-};
-
-Options ReadOptions(int argc, char** argv) {
-  Options options;
-  for (int i = 1; i < argc; ++i) {
-    const std::string arg = argv[i];
-    auto value = [&]() -> std::string {
-      if (i + 1 >= argc) throw UsageError(arg + " needs a value");
-      return argv[++i];
-    };
-    if (arg == "--gif") {
-      options.gif = value();
-    } else if (arg == "--png") {
-      options.png = value();
-    } else if (arg == "--trace") {
-      options.trace = value();
-    } else if (arg == "--png-frame") {
-      const std::string text = value();
-      char* end = nullptr;
-      errno = 0;
-      const long frame = std::strtol(text.c_str(), &end, 10);
-      if (text.empty() || *end != '\0' || errno != 0) throw UsageError("--png-frame " + text + ": expected a frame number");
-      options.pngFrame = frame;
-    } else if (arg == "--print-demo") {
-      options.printDemo = true;
-    } else if (arg == "--help" || arg == "-h") {
-      std::cout << kUsage;
-      std::exit(0);
-    } else if (!arg.empty() && arg[0] == '-') {
-      throw UsageError("unknown option " + arg);
-    } else if (options.scene.empty()) {
-      options.scene = arg;
-    } else {
-      throw UsageError("one scene at a time: " + options.scene + " and " + arg);
-    }
-  }
-  if (options.pngFrame && options.png.empty()) throw UsageError("--png-frame needs --png FILE");
-  if (options.gif.empty()) {
-    std::string stem = "demo";
-    if (!options.scene.empty()) {
-      stem = options.scene.substr(options.scene.rfind('/') + 1);
-      if (const auto dot = stem.rfind('.'); dot != std::string::npos && dot > 0) stem.resize(dot);
-    }
-    options.gif = stem + ".gif";
-  }
-  return options;
-}
+constexpr int kBadInput = 2;
 
 // False, with errno set, when the file cannot be read whole.
 bool ReadFile(const std::string& path, std::string& text) {
@@ -106,52 +49,110 @@ bool ReadFile(const std::string& path, std::string& text) {
   return !failed;
 }
 
+// Standard error, shared by the progress line and the warnings: a warning
+// starts on a line of its own.
+class Messages {
+ public:
+  Messages(std::string sceneName, int frames)
+      : sceneName_(std::move(sceneName)), frames_(frames), progress_(isatty(STDERR_FILENO) == 1) {}
+  // Also when a failure ends the run: its message starts on a line of its own.
+  ~Messages() { EndProgressLine(); }
+  Messages(const Messages&) = delete;
+  Messages& operator=(const Messages&) = delete;
+
+  void Warn(const std::string& text) {
+    EndProgressLine();
+    std::cerr << sceneName_ << ": " << text.substr(0, text.find(": ")) << ": warning"
+              << text.substr(text.find(": ")) << '\n';
+  }
+  void Progress(int frame) {
+    if (!progress_ || (frame % 10 != 9 && frame + 1 != frames_)) return;
+    std::cerr << "\rframe " << frame + 1 << " of " << frames_ << std::flush;
+    onProgressLine_ = true;
+  }
+  void EndProgressLine() {
+    if (onProgressLine_) std::cerr << '\n';
+    onProgressLine_ = false;
+  }
+
+ private:
+  std::string sceneName_;
+  int frames_;
+  bool progress_;
+  bool onProgressLine_ = false;
+};
+
+struct Run {
+  const Scene& scene;
+  const Options& options;
+  int frames;  // to play
+  std::vector<PngOutput> pngs;
+  std::string sceneName;
+};
+
 // Throws std::runtime_error on any failure; the output files are then removed.
-void Play(const Scene& scene, const Options& options) {
+void Play(const Run& run) {
+  const Scene& scene = run.scene;
   const Palette palette(scene);
-  OutputFile gifFile(options.gif);
-  std::optional<OutputFile> pngFile, traceFile;
-  if (!options.png.empty()) pngFile.emplace(options.png);
-  if (!options.trace.empty()) traceFile.emplace(options.trace);
-  const int pngFrame = options.pngFrame ? static_cast<int>(*options.pngFrame) : scene.frames - 1;
+  OutputFile gifFile(run.options.gif);
+  std::optional<OutputFile> traceFile;
+  if (!run.options.trace.empty()) traceFile.emplace(run.options.trace);
+  std::vector<std::unique_ptr<OutputFile>> pngFiles;
 
   GifWriter gif(gifFile.stream(), scene.width, scene.height, palette.colours(), scene.frameDelay);
   Player player(scene);
   FrameRenderer renderer(scene, palette);
-  const bool showProgress = isatty(STDERR_FILENO) == 1;
-  for (int frame = 0; frame < scene.frames; ++frame) {
+  Messages messages(run.sceneName, run.frames);
+  for (const std::string& warning : SettingWarnings(scene, player.extension())) messages.Warn(warning);
+  FrameWarnings frameWarnings;
+  for (int frame = 0; frame < run.frames; ++frame) {
     player.PlayFrame(frame);
+    for (const std::string& warning : frameWarnings.Check(scene, player, frame)) messages.Warn(warning);
     const Picture& picture = renderer.Render(player, frame);
     gif.AddFrame(picture);
-    if (pngFile && frame == pngFrame) WritePng(pngFile->stream(), picture, palette.colours());
-    if (traceFile) WriteTraceLine(traceFile->stream(), frame, scene, player);
-    if (showProgress && (frame % 10 == 9 || frame + 1 == scene.frames)) {
-      std::cerr << "\rframe " << frame + 1 << " of " << scene.frames << std::flush;
+    for (const PngOutput& png : run.pngs) {
+      if (png.frame != frame) continue;
+      // Written and closed at once: a run of many pictures holds no more
+      // than one open, and all are named only when the run has succeeded.
+      pngFiles.push_back(std::make_unique<OutputFile>(png.path));
+      WritePng(pngFiles.back()->stream(), picture, palette.colours());
+      pngFiles.back()->Close();
     }
+    if (traceFile) WriteTraceLine(traceFile->stream(), frame, scene, player);
+    messages.Progress(frame);
   }
-  if (showProgress) std::cerr << '\n';
+  messages.EndProgressLine();
   gif.Finish();
+  gifFile.Close();
+  if (traceFile) traceFile->Close();
   gifFile.Commit();
-  std::cout << options.gif << ": " << scene.frames << " frames of " << scene.width << "x" << scene.height << '\n';
-  if (pngFile) {
-    pngFile->Commit();
-    std::cout << options.png << ": frame " << pngFrame << '\n';
-  }
-  if (traceFile) {
-    traceFile->Commit();
-    std::cout << options.trace << ": " << scene.frames << " lines\n";
-  }
+  if (traceFile) traceFile->Commit();
+  for (auto& png : pngFiles) png->Commit();
+
+  // What was written; on standard error when standard output carries a file.
+  const bool toStandardOutput = run.options.gif == "-" || run.options.trace == "-" ||
+                                std::any_of(run.pngs.begin(), run.pngs.end(), [](const PngOutput& png) { return png.path == "-"; });
+  std::ostream& report = toStandardOutput ? std::cerr : std::cout;
+  report << run.options.gif << ": " << run.frames << " frames of " << scene.width << "x" << scene.height << '\n';
+  for (const PngOutput& png : run.pngs) report << png.path << ": frame " << png.frame << '\n';
+  if (traceFile) report << run.options.trace << ": " << run.frames << " lines\n";
 }
 
-}  // namespace
-
-int main(int argc, char** argv) {
+int Main(int argc, char** argv) {
   Options options;
   try {
     options = ReadOptions(argc, argv);
   } catch (const UsageError& error) {
     std::cerr << "scene_player: " << error.what() << "\n" << kUsage;
     return kBadInput;
+  }
+  if (options.help) {
+    std::cout << kUsage;
+    return 0;
+  }
+  if (options.version) {
+    std::cout << "scene_player " << TAVRIN_VERSION << '\n';
+    return 0;
   }
   if (options.printDemo) {
     std::cout << DemoScene();
@@ -162,11 +163,9 @@ int main(int argc, char** argv) {
   std::string text;
   if (options.scene.empty()) {
     text = DemoScene();
-  } else {
-    if (!ReadFile(options.scene, text)) {
-      std::cerr << sceneName << ": cannot read: " << std::strerror(errno) << '\n';
-      return kBadInput;
-    }
+  } else if (!ReadFile(options.scene, text)) {
+    std::cerr << sceneName << ": cannot read: " << std::strerror(errno) << '\n';
+    return kBadInput;
   }
 
   Scene scene;
@@ -176,18 +175,44 @@ int main(int argc, char** argv) {
     std::cerr << sceneName << ": " << error.place() << ": " << error.what() << '\n';
     return kBadInput;
   }
-  if (options.pngFrame && (*options.pngFrame < 0 || *options.pngFrame >= scene.frames)) {
-    std::cerr << "scene_player: --png-frame " << *options.pngFrame << ": expected a frame from 0 to "
-              << scene.frames - 1 << '\n';
+
+  Run run{scene, options, scene.frames, {}, sceneName};
+  try {
+    if (options.frames) {
+      if (*options.frames > scene.frames) {
+        throw UsageError("--frames " + std::to_string(*options.frames) + ": expected at most the scene's " +
+                         std::to_string(scene.frames) + " frames");
+      }
+      run.frames = static_cast<int>(*options.frames);
+    }
+    run.pngs = PngOutputs(options.pngs, run.frames);
+    std::vector<NamedPath> outputs = {{"--gif", options.gif}};
+    if (!options.trace.empty()) outputs.push_back({"--trace", options.trace});
+    for (const PngOutput& png : run.pngs) outputs.push_back({"--png", png.path});
+    std::vector<NamedPath> inputs;
+    if (!options.scene.empty()) inputs.push_back({"the scene", options.scene});
+    if (const std::string conflict = OutputConflict(inputs, outputs); !conflict.empty()) throw UsageError(conflict);
+    WatchPartialFiles(outputs.size());
+  } catch (const UsageError& error) {
+    std::cerr << "scene_player: " << error.what() << '\n';
     return kBadInput;
   }
 
-  try {
-    Play(scene, options);
-  } catch (const std::exception& error) {
-    // After the progress line, start the message on a line of its own.
-    std::cerr << (isatty(STDERR_FILENO) == 1 ? "\n" : "") << "scene_player: " << error.what() << '\n';
-    return kFailed;
-  }
+  Play(run);
   return 0;
+}
+
+}  // namespace
+
+// No exception leaves the player: a failure while playing or writing ends in
+// one line and status 1, after the outputs have been removed.
+int main(int argc, char** argv) {
+  try {
+    return Main(argc, argv);
+  } catch (const std::exception& error) {
+    std::cerr << "scene_player: " << error.what() << '\n';
+  } catch (...) {
+    std::cerr << "scene_player: stopped by an unknown failure\n";
+  }
+  return kFailed;
 }

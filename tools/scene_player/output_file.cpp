@@ -1,27 +1,61 @@
 #include "output_file.h"
 
 #include <cerrno>
-#include <cstdlib>
 #include <cstring>
 #include <stdexcept>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <vector>
 
+#include "output_paths.h"
+#include "partial_files.h"
+
 namespace scene_player {
 
+namespace {
+
+// The permissions a new file gets from the user's umask.
+mode_t NewFileMode() {
+  const mode_t mask = umask(0);
+  umask(mask);
+  return 0666 & ~mask;
+}
+
+}  // namespace
+
 OutputFile::OutputFile(std::string path) : path_(std::move(path)) {
-  const auto slash = path_.rfind('/');
-  const std::string folder = slash == std::string::npos ? "" : path_.substr(0, slash + 1);
-  const std::string name = slash == std::string::npos ? path_ : path_.substr(slash + 1);
+  if (path_ == "-") {
+    stream_ = stdout;
+    return;
+  }
+  target_ = FollowLinks(path_);
+  struct stat info {};
+  const bool exists = stat(target_.c_str(), &info) == 0;
+  if (exists && S_ISDIR(info.st_mode)) Fail("cannot write", EISDIR);
+  if (exists && !S_ISREG(info.st_mode)) {
+    // A device or a FIFO: it cannot be replaced, only written to.
+    stream_ = std::fopen(target_.c_str(), "wb");
+    if (stream_ == nullptr) Fail("cannot write", errno);
+    return;
+  }
+
+  const auto slash = target_.rfind('/');
+  const std::string folder = slash == std::string::npos ? "" : target_.substr(0, slash + 1);
+  const std::string name = slash == std::string::npos ? target_ : target_.substr(slash + 1);
   std::string pattern = folder + "." + name + ".XXXXXX";
   std::vector<char> buffer(pattern.begin(), pattern.end());
   buffer.push_back('\0');
-  const int fd = mkstemp(buffer.data());
-  if (fd < 0) Fail("cannot write", errno);
-  temporary_ = buffer.data();
-  // mkstemp makes the file private; a finished picture is an ordinary file.
-  fchmod(fd, 0644);
+  int fd = -1;
+  {
+    const SignalsHeld held;
+    fd = mkstemp(buffer.data());
+    if (fd < 0) Fail("cannot write", errno);
+    temporary_ = buffer.data();
+    slot_ = AddPartialFile(temporary_.c_str());
+  }
+  // mkstemp makes the file private; the finished file keeps the permissions
+  // of the file it replaces, or gets those of a new file.
+  fchmod(fd, exists ? (info.st_mode & 07777) : NewFileMode());
   stream_ = fdopen(fd, "wb");
   if (stream_ == nullptr) {
     const int error = errno;
@@ -31,25 +65,42 @@ OutputFile::OutputFile(std::string path) : path_(std::move(path)) {
 }
 
 OutputFile::~OutputFile() {
-  if (stream_ != nullptr) std::fclose(stream_);
-  if (!temporary_.empty()) std::remove(temporary_.c_str());
+  if (stream_ != nullptr && stream_ != stdout) std::fclose(stream_);
+  if (!temporary_.empty()) {
+    std::remove(temporary_.c_str());
+    ForgetPartialFile(slot_);
+  }
+}
+
+void OutputFile::Close() {
+  if (closed_) return;
+  closed_ = true;
+  bool written = std::fflush(stream_) == 0 && !std::ferror(stream_);
+  int error = errno;
+  if (stream_ != stdout) {
+    const bool closed = std::fclose(stream_) == 0;
+    if (!closed && written) error = errno;
+    written = written && closed;
+  }
+  stream_ = nullptr;
+  if (!written) Fail("cannot write", error);
 }
 
 void OutputFile::Commit() {
-  const bool written = std::fflush(stream_) == 0 && !std::ferror(stream_);
-  int error = errno;
-  const bool closed = std::fclose(stream_) == 0;
-  if (!closed && written) error = errno;
-  stream_ = nullptr;
-  if (!written || !closed) Fail("cannot write", error);
-  if (std::rename(temporary_.c_str(), path_.c_str()) != 0) Fail("cannot name", errno);
+  Close();
+  if (temporary_.empty()) return;
+  if (std::rename(temporary_.c_str(), target_.c_str()) != 0) Fail("cannot name", errno);
+  ForgetPartialFile(slot_);
   temporary_.clear();
 }
 
 void OutputFile::Fail(const std::string& what, int error) {
-  if (stream_ != nullptr) std::fclose(stream_);
+  if (stream_ != nullptr && stream_ != stdout) std::fclose(stream_);
   stream_ = nullptr;
-  if (!temporary_.empty()) std::remove(temporary_.c_str());
+  if (!temporary_.empty()) {
+    std::remove(temporary_.c_str());
+    ForgetPartialFile(slot_);
+  }
   temporary_.clear();
   throw std::runtime_error(what + " " + path_ + ": " + std::strerror(error));
 }

@@ -1,8 +1,13 @@
-// A file that appears under its name only when it is complete: it is written
-// to a temporary name in the same folder and renamed by Commit(). Until then,
-// and if anything fails, no file of that name is left behind.
+// One output of a run. A regular file, or a name where there is none yet, is
+// written under a hidden temporary name (.NAME.XXXXXX) in its folder and
+// renamed over the name by Commit(), so that it appears only when complete
+// and a failed or interrupted run leaves neither it nor a partial file. A
+// symbolic link is followed: the file it points at is replaced and the link
+// stays. Anything else (standard output for "-", a device, a FIFO) cannot be
+// replaced and is written directly.
 #pragma once
 
+#include <cstddef>
 #include <cstdio>
 #include <string>
 
@@ -10,7 +15,8 @@ namespace scene_player {
 
 class OutputFile {
  public:
-  // Throws std::runtime_error when the temporary file cannot be made.
+  // Throws std::runtime_error when the file cannot be made or opened, or
+  // when the path names a folder.
   explicit OutputFile(std::string path);
   ~OutputFile();
   OutputFile(const OutputFile&) = delete;
@@ -19,16 +25,21 @@ class OutputFile {
   std::FILE* stream() { return stream_; }
   const std::string& path() const { return path_; }
 
-  // Closes the file and gives it its name. Throws std::runtime_error when
-  // anything written failed; the temporary is then removed.
+  // Ends the writing. Throws std::runtime_error when anything written
+  // failed; a temporary is then removed.
+  void Close();
+  // Close(), then gives a temporary its name.
   void Commit();
 
  private:
   [[noreturn]] void Fail(const std::string& what, int error);
 
   std::string path_;
-  std::string temporary_;
+  std::string target_;     // where the bytes go: path_ with its links followed
+  std::string temporary_;  // empty when written directly
+  std::size_t slot_ = 0;   // the temporary's place among the partial files
   std::FILE* stream_ = nullptr;
+  bool closed_ = false;
 };
 
 }  // namespace scene_player

@@ -52,6 +52,8 @@ Player::Player(const Scene& scene) : scene_(scene), host_(SettingsRecord(scene.s
   for (std::size_t i = 0; i < scene_.objects.size(); ++i) {
     if (scene_.objects[i].atStart) Create(i);
   }
+  for (const SwingRule& rule : scene_.rules) rulesEnabled_.push_back(rule.enabled);
+  for (std::size_t i = 0; i < scene_.timeline.size(); ++i) due_.emplace(scene_.timeline[i].frame, i);
   host_.onEvent = [this](int32_t code, int32_t) { OnEvent(code); };
 }
 
@@ -87,20 +89,34 @@ void Player::Create(std::size_t index) {
   target.state = State::Live;
   target.exactX = spec.x;
   target.exactY = spec.y;
+  indexes_[target.object] = static_cast<int>(index);
+}
+
+void Player::Forget(std::size_t index) {
+  indexes_.erase(objects_[index].object);
+  objects_[index] = ObjectState{State::Gone};
 }
 
 void Player::PlayFrame(int frame) {
-  for (; nextEntry_ < scene_.timeline.size() && scene_.timeline[nextEntry_].frame <= frame; ++nextEntry_) {
-    RunSteps(scene_.timeline[nextEntry_].steps);
-  }
-  // The host frees the objects destroyed so far once this frame's handle
-  // call has run; those destroyed by rules during it wait for the next frame.
-  std::vector<std::size_t> freed;
-  for (std::size_t i = 0; i < objects_.size(); ++i) {
-    if (objects_[i].state == State::Destroyed) freed.push_back(i);
+  frame_ = frame;
+  while (!due_.empty() && due_.top().first <= frame) {
+    const auto [at, index] = due_.top();
+    due_.pop();
+    const TimelineEntry& entry = scene_.timeline[index];
+    if (entry.every > 0) {
+      repetition_ = (at - entry.frame) / entry.every;
+      if (entry.last - at >= entry.every) due_.emplace(at + entry.every, index);
+    }
+    RunSteps(entry.steps);
   }
   host_.RunFrame();
-  for (std::size_t i : freed) objects_[i] = ObjectState{State::Gone};
+  // The host may free an object as soon as the frame in which it was
+  // destroyed has been handled (this one frees those destroyed before the
+  // handle call, and those destroyed by rules during it a frame later), so
+  // every destroyed object is forgotten now and never touched again.
+  for (std::size_t i = 0; i < objects_.size(); ++i) {
+    if (objects_[i].state == State::Destroyed) Forget(i);
+  }
   if (eventFailure_) std::rethrow_exception(std::exchange(eventFailure_, nullptr));
 }
 
@@ -112,13 +128,8 @@ HostObject* Player::Live(int index) const {
 }
 
 int Player::IndexOf(const HostObject* object) const {
-  for (std::size_t i = 0; i < objects_.size(); ++i) {
-    const ObjectState& target = objects_[i];
-    if ((target.state == State::Live || target.state == State::Destroyed) && target.object == object) {
-      return static_cast<int>(i);
-    }
-  }
-  return -1;
+  const auto it = indexes_.find(object);
+  return it == indexes_.end() ? -1 : it->second;
 }
 
 void Player::OnEvent(int32_t code) {
@@ -126,8 +137,9 @@ void Player::OnEvent(int32_t code) {
   try {
     // The host asks the library's own condition which rules apply: "On Swing
     // %0" is true for the chain whose step raised the event.
-    for (const SwingRule& rule : scene_.rules) {
-      if (host_.Condition(kOnSwingCondition, rule.chain) != 0) RunSteps(rule.steps);
+    for (std::size_t i = 0; i < scene_.rules.size(); ++i) {
+      const SwingRule& rule = scene_.rules[i];
+      if (rulesEnabled_[i] && host_.Condition(kOnSwingCondition, rule.chain) != 0) RunSteps(rule.steps);
     }
   } catch (...) {
     eventFailure_ = std::current_exception();
@@ -157,6 +169,10 @@ void Player::RunStep(const Step& step) {
     case Step::Kind::MoveTo:
     case Step::Kind::MoveBy:
       if (Live(step.object)) Move(objects_[static_cast<std::size_t>(step.object)], step);
+      return;
+    case Step::Kind::Enable:
+    case Step::Kind::Disable:
+      rulesEnabled_[static_cast<std::size_t>(step.rule)] = step.kind == Step::Kind::Enable;
       return;
   }
 }
@@ -196,6 +212,11 @@ void Player::Move(ObjectState& target, const Step& step) {
 }
 
 double Player::Evaluate(const Value& value) {
+  switch (value.count) {
+    case Value::Count::Frame: return value.plus + value.times * frame_;
+    case Value::Count::Repetition: return value.plus + value.times * repetition_;
+    case Value::Count::None: break;
+  }
   if (value.expression < 0) return value.number;
   int32_t params[2] = {0, 0};
   for (std::size_t i = 0; i < value.params.size() && i < 2; ++i) params[i] = ToInteger(Evaluate(value.params[i]));

@@ -6,6 +6,10 @@
 
 #include <cstdint>
 #include <exception>
+#include <functional>
+#include <queue>
+#include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "host.h"
@@ -22,15 +26,16 @@ class Player {
 
   // Frame `frame` (frames are played in order from 0): the timeline steps of
   // that frame, then the host's frame, in which the library swings the chains
-  // and raises "On Swing".
+  // and raises "On Swing". Objects destroyed by then are forgotten when it
+  // returns: no pointer to them is kept past the frame in which they went.
   void PlayFrame(int frame);
 
   const RunData& extension() const { return *extension_; }
   // The host object of scene object `index`, or null while it is not on the
   // frame (not yet created, or destroyed).
   const HostObject* live(std::size_t index) const;
-  // The scene object that `object` is, or -1. Also finds objects destroyed in
-  // this frame, which the library may still refer to until the next one.
+  // The scene object that `object` is, or -1. During a frame this also finds
+  // the objects destroyed in it.
   int IndexOf(const HostObject* object) const;
 
  private:
@@ -46,6 +51,7 @@ class Player {
 
   void CheckRoutines() const;
   void Create(std::size_t index);
+  void Forget(std::size_t index);
   void RunSteps(const std::vector<Step>& steps);
   void RunStep(const Step& step);
   void RunAction(const Step& step);
@@ -58,7 +64,13 @@ class Player {
   standin::Host host_;
   const RunData* extension_;
   std::vector<ObjectState> objects_;
-  std::size_t nextEntry_ = 0;
+  std::unordered_map<const HostObject*, int> indexes_;  // of the objects in objects_
+  std::vector<bool> rulesEnabled_;
+  // When each timeline entry runs next: (frame, entry), earliest first, and
+  // in the order of the file within a frame.
+  std::priority_queue<std::pair<int, std::size_t>, std::vector<std::pair<int, std::size_t>>, std::greater<>> due_;
+  int frame_ = 0;       // the frame being played, for {"count": "frame"}
+  int repetition_ = 0;  // of the repeating entry being run, for {"count": "repetition"}
   // An exception must not cross the library's swing step: one thrown while
   // a rule runs is kept here and rethrown once the frame is over.
   std::exception_ptr eventFailure_;

@@ -34,31 +34,43 @@ struct ObjectSpec {
   bool atStart = true;  // false: created later by a "create" step
 };
 
-// A number given in the scene, or an expression of the library evaluated
-// each time the step runs.
+// A number given in the scene, an expression of the library evaluated each
+// time the step runs, or a count: `plus` + `times` x the frame number or the
+// repetition of a repeating timeline entry (0 at its first frame).
 struct Value {
+  enum class Count { None, Frame, Repetition };
   double number = 0.0;
-  int expression = -1;  // expression code; -1 for a plain number
+  int expression = -1;  // expression code; -1 for a plain number or a count
   std::vector<Value> params;
+  Count count = Count::None;
+  double times = 1.0, plus = 0.0;
 };
 
 struct Step {
-  enum class Kind { Action, Create, Destroy, MoveTo, MoveBy };
+  enum class Kind { Action, Create, Destroy, MoveTo, MoveBy, Enable, Disable };
   Kind kind = Kind::Action;
   std::string place;        // where it stands in the scene file
   int action = -1;          // Action: the action's code
   int object = -1;          // index into Scene::objects: the object acted on or passed
+  int rule = -1;            // Enable, Disable: index into Scene::rules
   std::vector<Value> values;  // an action's number parameters, or a move's x and y
 };
 
+// Runs its steps at `frame`, and when `every` is not 0 again every `every`
+// frames up to `last`.
 struct TimelineEntry {
   int frame = 0;
+  int every = 0;
+  int last = 0;
   std::vector<Step> steps;
 };
 
-// Runs its steps whenever "On Swing %0" is true for `chain`.
+// Runs its steps whenever "On Swing %0" is true for `chain`, while it is
+// enabled.
 struct SwingRule {
+  std::string name;  // may be empty: then no step can switch it
   int32_t chain = 0;
+  bool enabled = true;
   std::vector<Step> steps;
 };
 
@@ -70,7 +82,7 @@ struct Scene {
   int frameDelay = 2;  // hundredths of a second per GIF frame
   int trail = 40;      // frames for which a platform's past positions stay drawn
   std::vector<ObjectSpec> objects;
-  std::vector<TimelineEntry> timeline;  // in frame order
+  std::vector<TimelineEntry> timeline;  // in the order of the file
   std::vector<SwingRule> rules;
 };
 

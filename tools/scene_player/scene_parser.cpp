@@ -132,6 +132,10 @@ std::string ActionLabel(int code) {
   return Quoted(action.menuText ? action.menuText : action.displayText);
 }
 
+// Where a step stands, which decides what it may do: an entry of the
+// timeline that runs once, one that repeats, or an "On Swing" rule.
+enum class Where { Once, Repeating, Rule };
+
 // What a scene knows about an object name while its timeline is read in
 // frame order.
 struct NameState {
@@ -151,16 +155,21 @@ class Reader {
   void Define(ObjectSpec spec);
   void CollectCreatedNames(const json& timeline);
   void ReadTimeline(const json& root);
+  TimelineEntry ReadEntryFrames(const json& entry, const std::string& place);
   void ReadRules(const json& root);
-  std::vector<Step> ReadSteps(const json& value, const std::string& place, bool inRule);
-  Step ReadStep(const json& value, const std::string& place, bool inRule);
-  Step ReadAction(const json& value, const std::string& place, bool inRule);
-  Step ReadMove(const json& value, const std::string& place, bool inRule);
-  int ObjectNamed(const json& value, const std::string& place, bool inRule);
-  Value ReadValue(const json& value, const std::string& place, ParamKind kind, int depth = 0);
+  void ReadRuleSteps(const json& root);
+  std::vector<Step> ReadSteps(const json& value, const std::string& place, Where where);
+  Step ReadStep(const json& value, const std::string& place, Where where);
+  Step ReadAction(const json& value, const std::string& place, Where where);
+  Step ReadMove(const json& value, const std::string& place, Where where);
+  int ObjectNamed(const json& value, const std::string& place, Where where);
+  int RuleNamed(const json& value, const std::string& place);
+  Value ReadValue(const json& value, const std::string& place, ParamKind kind, Where where, int depth = 0);
+  Value ReadCount(const json& value, const std::string& place, Where where);
 
   Scene scene_;
   std::map<std::string, NameState> names_;
+  std::map<std::string, int> ruleNames_;
 };
 
 Scene Reader::Read(const json& root) {
@@ -179,8 +188,11 @@ Scene Reader::Read(const json& root) {
     RequireArray(*objects, "objects", "an array of objects");
     for (std::size_t i = 0; i < objects->size(); ++i) Define(ReadObject((*objects)[i], Element("objects", i), true));
   }
-  ReadTimeline(root);
+  // Rules are read before the timeline, which may switch them by name, and
+  // their steps after it, which may name objects that it creates.
   ReadRules(root);
+  ReadTimeline(root);
+  ReadRuleSteps(root);
 
   if (PaletteSize(scene_) > kMaxPaletteColours) {
     Fail("objects", "the objects' colours and their trail shades make " + std::to_string(PaletteSize(scene_)) +
@@ -290,26 +302,56 @@ void Reader::ReadTimeline(const json& root) {
   const json* timeline = Find(root, "timeline");
   if (timeline == nullptr) return;
   RequireArray(*timeline, "timeline", "an array of entries, each with a \"frame\" and the steps to \"do\"");
-  std::vector<int> frames;
+  std::vector<TimelineEntry> entries;
   for (std::size_t i = 0; i < timeline->size(); ++i) {
     const std::string place = Element("timeline", i);
     const json& entry = (*timeline)[i];
-    RequireObject(entry, place, "an entry with a \"frame\" and the steps to \"do\"");
-    CheckKeys(entry, place, {"frame", "do"});
-    const std::string what = "the frame at which the steps run (the first frame is 0)";
-    frames.push_back(static_cast<int>(
-        WholeNumber(Require(entry, place, "frame", what), Member(place, "frame"), 0, scene_.frames - 1, what)));
+    entries.push_back(ReadEntryFrames(entry, place));
     RequireArray(Require(entry, place, "do", "an array of steps"), Member(place, "do"), "an array of steps");
   }
   CollectCreatedNames(*timeline);
 
+  // Names are checked in the order the entries first run.
   std::vector<std::size_t> order(timeline->size());
   for (std::size_t i = 0; i < order.size(); ++i) order[i] = i;
-  std::stable_sort(order.begin(), order.end(), [&](std::size_t a, std::size_t b) { return frames[a] < frames[b]; });
+  std::stable_sort(order.begin(), order.end(),
+                   [&](std::size_t a, std::size_t b) { return entries[a].frame < entries[b].frame; });
   for (std::size_t i : order) {
-    const std::string place = Element("timeline", i);
-    scene_.timeline.push_back({frames[i], ReadSteps((*timeline)[i]["do"], Member(place, "do"), false)});
+    TimelineEntry& entry = entries[i];
+    const std::string place = Member(Element("timeline", i), "do");
+    entry.steps = ReadSteps((*timeline)[i]["do"], place, entry.every ? Where::Repeating : Where::Once);
   }
+  scene_.timeline = std::move(entries);
+}
+
+// An entry runs once at its "frame", or from "from" to "to" "every" so many
+// frames.
+TimelineEntry Reader::ReadEntryFrames(const json& entry, const std::string& place) {
+  RequireObject(entry, place, "an entry with a \"frame\" (or \"every\", \"from\" and \"to\") and the steps to \"do\"");
+  CheckKeys(entry, place, {"frame", "every", "from", "to", "do"});
+  const int lastFrame = scene_.frames - 1;
+  TimelineEntry result;
+  if (Find(entry, "frame")) {
+    if (Find(entry, "every") || Find(entry, "from") || Find(entry, "to")) {
+      Fail(place, "expected either \"frame\" for steps that run once, or \"every\" with \"from\" and \"to\" for "
+                  "steps that repeat, not both");
+    }
+    const std::string what = "the frame at which the steps run (the first frame is 0)";
+    result.frame = static_cast<int>(WholeNumber(entry["frame"], Member(place, "frame"), 0, lastFrame, what));
+    return result;
+  }
+  if (!Find(entry, "every")) {
+    Fail(place, "missing \"frame\": expected the frame at which the steps run, or \"every\" with \"from\" and \"to\" "
+                "for steps that repeat");
+  }
+  result.every = static_cast<int>(WholeNumber(entry["every"], Member(place, "every"), 1, kMaxFrames,
+                                              "the number of frames from one repetition to the next"));
+  const std::string fromWhat = "the first frame at which the steps run";
+  result.frame = static_cast<int>(
+      WholeNumber(Require(entry, place, "from", fromWhat), Member(place, "from"), 0, lastFrame, fromWhat));
+  result.last = static_cast<int>(OptionalWholeNumber(entry, place, "to", lastFrame, result.frame, lastFrame,
+                                                     "the last frame at which the steps may run"));
+  return result;
 }
 
 void Reader::ReadRules(const json& root) {
@@ -320,39 +362,75 @@ void Reader::ReadRules(const json& root) {
     const std::string place = Element("onSwing", i);
     const json& rule = (*rules)[i];
     RequireObject(rule, place, "a rule with a \"chain\" index and the steps to \"do\"");
-    CheckKeys(rule, place, {"chain", "do"});
+    CheckKeys(rule, place, {"name", "chain", "enabled", "do"});
     const std::string what = "the index of the chain whose swing runs the steps";
     SwingRule parsed;
     parsed.chain = static_cast<int32_t>(
         WholeNumber(Require(rule, place, "chain", what), Member(place, "chain"), INT32_MIN, INT32_MAX, what));
-    const json& steps = Require(rule, place, "do", "an array of steps");
-    RequireArray(steps, Member(place, "do"), "an array of steps");
-    parsed.steps = ReadSteps(steps, Member(place, "do"), true);
+    if (const json* name = Find(rule, "name")) {
+      const std::string namePlace = Member(place, "name");
+      parsed.name = Text(*name, namePlace, "the rule's name, for the steps that switch it on and off");
+      if (parsed.name.empty()) Fail(namePlace, "expected the rule's name, found an empty text");
+      const auto [it, added] = ruleNames_.emplace(parsed.name, static_cast<int>(i));
+      if (!added) {
+        Fail(namePlace, "the name " + Quoted(parsed.name) + " is already taken by " + Element("onSwing", it->second) +
+                            "; expected a name of its own");
+      }
+    }
+    if (const json* enabled = Find(rule, "enabled")) {
+      if (!enabled->is_boolean()) Expected(Member(place, "enabled"), "true or false", *enabled);
+      parsed.enabled = enabled->get<bool>();
+    }
+    RequireArray(Require(rule, place, "do", "an array of steps"), Member(place, "do"), "an array of steps");
     scene_.rules.push_back(std::move(parsed));
   }
 }
 
-std::vector<Step> Reader::ReadSteps(const json& value, const std::string& place, bool inRule) {
+void Reader::ReadRuleSteps(const json& root) {
+  for (std::size_t i = 0; i < scene_.rules.size(); ++i) {
+    scene_.rules[i].steps = ReadSteps(root["onSwing"][i]["do"], Member(Element("onSwing", i), "do"), Where::Rule);
+  }
+}
+
+std::vector<Step> Reader::ReadSteps(const json& value, const std::string& place, Where where) {
   std::vector<Step> steps;
-  for (std::size_t k = 0; k < value.size(); ++k) steps.push_back(ReadStep(value[k], Element(place, k), inRule));
+  for (std::size_t k = 0; k < value.size(); ++k) steps.push_back(ReadStep(value[k], Element(place, k), where));
   return steps;
 }
 
-Step Reader::ReadStep(const json& value, const std::string& place, bool inRule) {
-  const std::string what = "a step: an object with one of \"action\", \"create\", \"destroy\" or \"move\"";
+Step Reader::ReadStep(const json& value, const std::string& place, Where where) {
+  const std::string what =
+      "a step: an object with one of \"action\", \"create\", \"destroy\", \"move\", \"enable\" or \"disable\"";
   RequireObject(value, place, what);
   int kinds = 0;
-  for (const char* key : {"action", "create", "destroy", "move"}) kinds += Find(value, key) ? 1 : 0;
-  if (kinds != 1) Fail(place, "expected exactly one of \"action\", \"create\", \"destroy\" or \"move\" in a step");
+  for (const char* key : {"action", "create", "destroy", "move", "enable", "disable"}) kinds += Find(value, key) ? 1 : 0;
+  if (kinds != 1) {
+    Fail(place, "expected exactly one of \"action\", \"create\", \"destroy\", \"move\", \"enable\" or \"disable\" "
+                "in a step");
+  }
 
-  if (Find(value, "action")) return ReadAction(value, place, inRule);
-  if (Find(value, "move")) return ReadMove(value, place, inRule);
+  if (Find(value, "action")) return ReadAction(value, place, where);
+  if (Find(value, "move")) return ReadMove(value, place, where);
 
   Step step;
   step.place = place;
+  for (const char* key : {"enable", "disable"}) {
+    if (const json* rule = Find(value, key)) {
+      CheckKeys(value, place, {key});
+      step.kind = key[0] == 'e' ? Step::Kind::Enable : Step::Kind::Disable;
+      step.rule = RuleNamed(*rule, Member(place, key));
+      return step;
+    }
+  }
   if (const json* created = Find(value, "create")) {
     CheckKeys(value, place, {"create"});
-    if (inRule) Fail(place, "a rule runs at every swing, so it cannot create an object; expected \"create\" in the timeline");
+    if (where == Where::Rule) {
+      Fail(place, "a rule runs at every swing, so it cannot create an object; expected \"create\" in the timeline");
+    }
+    if (where == Where::Repeating) {
+      Fail(place, "a repeating entry runs many times, so it cannot create an object; expected \"create\" in an entry "
+                  "with \"frame\"");
+    }
     step.kind = Step::Kind::Create;
     ObjectSpec spec = ReadObject(*created, Member(place, "create"), false);
     step.object = static_cast<int>(scene_.objects.size());
@@ -361,12 +439,21 @@ Step Reader::ReadStep(const json& value, const std::string& place, bool inRule) 
   }
   CheckKeys(value, place, {"destroy"});
   step.kind = Step::Kind::Destroy;
-  step.object = ObjectNamed(value["destroy"], Member(place, "destroy"), inRule);
-  if (!inRule) names_[scene_.objects[step.object].name].destroyedAt = place;
+  step.object = ObjectNamed(value["destroy"], Member(place, "destroy"), where);
+  if (where != Where::Rule) names_[scene_.objects[step.object].name].destroyedAt = place;
   return step;
 }
 
-Step Reader::ReadAction(const json& value, const std::string& place, bool inRule) {
+int Reader::RuleNamed(const json& value, const std::string& place) {
+  const std::string& name = Text(value, place, "a rule's name");
+  const auto it = ruleNames_.find(name);
+  if (it == ruleNames_.end()) {
+    Fail(place, "no rule named " + Quoted(name) + "; expected the \"name\" of a rule in \"onSwing\"");
+  }
+  return it->second;
+}
+
+Step Reader::ReadAction(const json& value, const std::string& place, Where where) {
   CheckKeys(value, place, {"action", "params"});
   const std::string what = "an action's menu text such as \"Start Chain\" or its display text such as "
                            "\"Start Chain at index %0\"";
@@ -391,19 +478,19 @@ Step Reader::ReadAction(const json& value, const std::string& place, bool inRule
   for (int p = 0; p < action.paramCount; ++p) {
     const std::string paramPlace = Element(paramsPlace, static_cast<std::size_t>(p));
     if (action.kinds[p] == ParamKind::Object) {
-      step.object = ObjectNamed((*params)[p], paramPlace, inRule);
+      step.object = ObjectNamed((*params)[p], paramPlace, where);
     } else {
-      step.values.push_back(ReadValue((*params)[p], paramPlace, action.kinds[p]));
+      step.values.push_back(ReadValue((*params)[p], paramPlace, action.kinds[p], where));
     }
   }
   return step;
 }
 
-Step Reader::ReadMove(const json& value, const std::string& place, bool inRule) {
+Step Reader::ReadMove(const json& value, const std::string& place, Where where) {
   CheckKeys(value, place, {"move", "to", "by"});
   Step step;
   step.place = place;
-  step.object = ObjectNamed(value["move"], Member(place, "move"), inRule);
+  step.object = ObjectNamed(value["move"], Member(place, "move"), where);
   const json* to = Find(value, "to");
   const json* by = Find(value, "by");
   if ((to == nullptr) == (by == nullptr)) {
@@ -414,11 +501,11 @@ Step Reader::ReadMove(const json& value, const std::string& place, bool inRule) 
   const json& pair = to ? *to : *by;
   const std::string what = "an array of two values, x and y";
   if (!pair.is_array() || pair.size() != 2) Expected(pairPlace, what, pair);
-  for (std::size_t i = 0; i < 2; ++i) step.values.push_back(ReadValue(pair[i], Element(pairPlace, i), ParamKind::Float));
+  for (std::size_t i = 0; i < 2; ++i) step.values.push_back(ReadValue(pair[i], Element(pairPlace, i), ParamKind::Float, where));
   return step;
 }
 
-int Reader::ObjectNamed(const json& value, const std::string& place, bool inRule) {
+int Reader::ObjectNamed(const json& value, const std::string& place, Where where) {
   const std::string& name = Text(value, place, "an object's name");
   const auto it = names_.find(name);
   const NameState* state = it == names_.end() ? nullptr : &it->second;
@@ -428,7 +515,7 @@ int Reader::ObjectNamed(const json& value, const std::string& place, bool inRule
   }
   // A rule runs whenever its chain swings; the object may or may not exist
   // then, and the step does nothing while it does not.
-  if (inRule) return state->object;
+  if (where == Where::Rule) return state->object;
   if (state->object < 0) {
     Fail(place, "object " + Quoted(name) + " is used before it exists; it is created at " + state->createdAt +
                     ", expected a step at a later frame, or later in the same frame");
@@ -440,7 +527,7 @@ int Reader::ObjectNamed(const json& value, const std::string& place, bool inRule
   return state->object;
 }
 
-Value Reader::ReadValue(const json& value, const std::string& place, ParamKind kind, int depth) {
+Value Reader::ReadValue(const json& value, const std::string& place, ParamKind kind, Where where, int depth) {
   Value result;
   if (value.is_number()) {
     if (kind == ParamKind::Integer) {
@@ -450,9 +537,11 @@ Value Reader::ReadValue(const json& value, const std::string& place, ParamKind k
     }
     return result;
   }
-  const std::string what = kind == ParamKind::Integer
-                               ? "an integer, or an expression such as {\"expression\": \"ChainNum(\"}"
-                               : "a number, or an expression such as {\"expression\": \"DeltaX(\", \"params\": [0]}";
+  const std::string what =
+      std::string(kind == ParamKind::Integer ? "an integer, or an expression such as {\"expression\": \"ChainNum(\"}"
+                                             : "a number, or an expression such as {\"expression\": \"DeltaX(\", \"params\": [0]}") +
+      ", or a count such as {\"count\": \"frame\", \"times\": 2}";
+  if (value.is_object() && Find(value, "count")) return ReadCount(value, place, where);
   if (!value.is_object() || !Find(value, "expression")) Expected(place, what, value);
   CheckKeys(value, place, {"expression", "params"});
   if (depth >= kMaxExpressionDepth) Fail(place, "expressions nested too deeply; expected at most 16 levels");
@@ -470,7 +559,34 @@ Value Reader::ReadValue(const json& value, const std::string& place, ParamKind k
              (expression.paramCount == 1 ? "" : "s") + ", found " + std::to_string(count));
   }
   for (std::size_t i = 0; i < count; ++i) {
-    result.params.push_back(ReadValue((*params)[i], Element(Member(place, "params"), i), ParamKind::Integer, depth + 1));
+    result.params.push_back(
+        ReadValue((*params)[i], Element(Member(place, "params"), i), ParamKind::Integer, where, depth + 1));
+  }
+  return result;
+}
+
+Value Reader::ReadCount(const json& value, const std::string& place, Where where) {
+  CheckKeys(value, place, {"count", "times", "plus"});
+  Value result;
+  const std::string countPlace = Member(place, "count");
+  const std::string what = "\"frame\" (the frame number) or \"repetition\" (0, 1, 2... in a repeating entry)";
+  const std::string& count = Text(value["count"], countPlace, what);
+  if (count == "frame") {
+    result.count = Value::Count::Frame;
+  } else if (count == "repetition") {
+    if (where != Where::Repeating) {
+      Fail(countPlace, "only a repeating entry counts repetitions; expected it in an entry with \"every\", or "
+                       "{\"count\": \"frame\"}");
+    }
+    result.count = Value::Count::Repetition;
+  } else {
+    Expected(countPlace, what, value["count"]);
+  }
+  for (const auto& [key, field] : {std::pair{"times", &result.times}, std::pair{"plus", &result.plus}}) {
+    if (const json* number = Find(value, key)) {
+      if (!number->is_number()) Expected(Member(place, key), "a number", *number);
+      *field = number->get<double>();
+    }
   }
   return result;
 }
@@ -485,19 +601,48 @@ std::string LineAndColumn(std::string_view text, std::size_t offset) {
   return "line " + std::to_string(line) + ", column " + std::to_string(column);
 }
 
+// Builds the document as json::parse does, but keeps where a failure was
+// found: the parser's own exception for a number too large for a double
+// carries no position. (The parser calls these members of the type it is
+// given, so hiding the base class's member is enough.)
+class DocumentBuilder : public nlohmann::detail::json_sax_dom_parser<json> {
+ public:
+  explicit DocumentBuilder(json& root) : json_sax_dom_parser(root, false) {}
+
+  bool parse_error(std::size_t position, const std::string& token, const nlohmann::detail::exception& error) {
+    failed = true;
+    end = position;
+    lastToken = token;
+    id = error.id;
+    message = error.what();
+    return false;
+  }
+
+  bool failed = false;
+  std::size_t end = 0;  // bytes read when it failed
+  std::string lastToken;
+  int id = 0;
+  std::string message;
+};
+
+constexpr int kNumberOverflow = 406;  // the parser's error id for a number beyond a double
+
 }  // namespace
 
 Scene ParseScene(std::string_view text) {
   json root;
-  try {
-    root = json::parse(text);
-  } catch (const json::parse_error& error) {
-    // The library's message repeats the position; keep what it found and expected.
-    std::string message = error.what();
+  DocumentBuilder builder(root);
+  if (!json::sax_parse(text, &builder) || builder.failed) {
+    if (builder.id == kNumberOverflow) {
+      const std::size_t start = builder.end >= builder.lastToken.size() ? builder.end - builder.lastToken.size() : 0;
+      throw SceneError(LineAndColumn(text, start), "the number " + builder.lastToken +
+                                                       " is out of range; expected a number from -1.7e308 to 1.7e308");
+    }
+    // The parser's message repeats the position; keep what it found and expected.
+    std::string message = builder.message;
     const auto at = message.find(": ", message.find("column"));
     if (at != std::string::npos) message = message.substr(at + 2);
-    const std::size_t offset = error.byte > 0 ? error.byte - 1 : 0;
-    throw SceneError(LineAndColumn(text, offset), "not JSON: " + message);
+    throw SceneError(LineAndColumn(text, builder.end > 0 ? builder.end - 1 : 0), "not JSON: " + message);
   }
   return Reader().Read(root);
 }

@@ -1,0 +1,101 @@
+// What authors write to see a scene quickly: several PNG frames from one
+// run, a repeating timeline entry in place of one entry per frame, rules
+// switched on and off, and the warnings about what the library does.
+#include <gtest/gtest.h>
+
+#include <nlohmann/json.hpp>
+
+#include "player_run.h"
+
+namespace {
+
+using namespace player_test;
+using nlohmann::json;
+
+// One swinging chain of two links, a rider carried by a rule that the
+// timeline switches off at frame 3 and on again at frame 6, and `extra`
+// timeline entries.
+std::string Scene(const std::string& extra) {
+  return R"({"frames": 12, "canvas": {"width": 200, "height": 120},
+  "objects": [
+    {"name": "anchor", "x": 100, "y": 10, "width": 8, "height": 8},
+    {"name": "link1", "x": 0, "y": 0, "width": 4, "height": 20},
+    {"name": "link2", "x": 0, "y": 0, "width": 4, "height": 20},
+    {"name": "platform", "x": 0, "y": 0, "width": 30, "height": 6},
+    {"name": "rider", "x": 0, "y": 100, "width": 6, "height": 6},
+    {"name": "box", "x": 0, "y": 50, "width": 6, "height": 6}],
+  "timeline": [
+    {"frame": 0, "do": [{"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Link", "params": ["link1"]},
+      {"action": "Add Link", "params": ["link2"]}, {"action": "Add Platform", "params": ["platform"]},
+      {"action": "Start All"}]},
+    {"frame": 3, "do": [{"disable": "carry"}]},
+    {"frame": 6, "do": [{"enable": "carry"}]})" +
+         extra + R"(],
+  "onSwing": [{"name": "carry", "chain": 0, "do": [{"move": "rider", "by": [1, 0]}]}]})";
+}
+
+TEST(SceneAuthoringTest, SeveralPngFramesOfOneRunMatchTheSameFramesOfSeparateRuns) {
+  Folder folder;
+  folder.Write("scene.json", Scene(""));
+  const PlayerRun run = RunPlayer({"scene.json", "--frames", "9", "--png", "f%02d.png", "--png-frame", "2,4-8/4",
+                                   "--png", "last.png"},
+                                  folder);
+  ASSERT_EQ(run.status, 0) << run.err;
+  for (const auto& [frame, name] : {std::pair{"2", "f02.png"}, {"4", "f04.png"}, {"8", "f08.png"}, {"8", "last.png"}}) {
+    ASSERT_EQ(RunPlayer({"scene.json", "--gif", "alone.gif", "--png", "alone.png", "--png-frame", frame}, folder).status, 0);
+    EXPECT_EQ(ReadFile(folder / name), ReadFile(folder / "alone.png")) << name;
+  }
+}
+
+// The repeating entry sets the angle from the repetition and moves the box
+// by the frame number: the same motion as one entry per frame.
+TEST(SceneAuthoringTest, RepeatingEntryPlaysAsTheSameStepsWrittenFrameByFrame) {
+  Folder folder;
+  folder.Write("repeat.json", Scene(R"(, {"every": 3, "from": 1, "to": 10, "do": [
+      {"action": "Set Angle", "params": [0, {"count": "repetition", "times": 5, "plus": 20}]},
+      {"move": "box", "by": [{"count": "frame", "times": 0.5}, 1]}]})"));
+  std::string entries;
+  for (int frame = 1, repetition = 0; frame <= 10; frame += 3, ++repetition) {
+    entries += R"(, {"frame": )" + std::to_string(frame) + R"(, "do": [{"action": "Set Angle", "params": [0, )" +
+               std::to_string(20 + 5 * repetition) + R"(]}, {"move": "box", "by": [)" + std::to_string(frame * 0.5) +
+               ", 1]}]}";
+  }
+  folder.Write("explicit.json", Scene(entries));
+  ASSERT_EQ(RunPlayer({"repeat.json", "--trace", "repeat.jsonl"}, folder).status, 0);
+  ASSERT_EQ(RunPlayer({"explicit.json", "--trace", "explicit.jsonl"}, folder).status, 0);
+  const std::string trace = ReadFile(folder / "repeat.jsonl");
+  EXPECT_EQ(trace, ReadFile(folder / "explicit.jsonl"));
+
+  // The rider moves one pixel a swing, but not while the rule is off (frames 3 to 5).
+  const std::vector<std::string> lines = Lines(trace);
+  ASSERT_EQ(lines.size(), 12u);
+  for (const auto& [frame, x] : {std::pair{2, 3}, {5, 3}, {11, 9}}) {
+    EXPECT_EQ(json::parse(lines[frame])["objects"][4]["x"], x) << "frame " << frame;
+  }
+}
+
+TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
+  Folder folder;
+  folder.Write("scene.json", R"({"frames": 5, "settings": {"gravity": "9.8x"},
+    "objects": [{"name": "a", "x": 10, "y": 10, "width": 4, "height": 4},
+      {"name": "b", "x": 50, "y": 10, "width": 4, "height": 4},
+      {"name": "l1", "x": 0, "y": 0, "width": 4, "height": 10}, {"name": "l2", "x": 0, "y": 0, "width": 4, "height": 12},
+      {"name": "l3", "x": 0, "y": 0, "width": 4, "height": 10}],
+    "timeline": [{"frame": 0, "do": [{"action": "Add Anchor", "params": ["a"]}, {"action": "Add Anchor", "params": ["b"]},
+      {"action": "Add Link", "params": ["l1"]}, {"action": "Add Link", "params": ["l2"]},
+      {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"}]},
+      {"frame": 2, "do": [{"action": "Set Angle", "params": [1, 1e39]}]}]})");
+  const PlayerRun run = RunPlayer({"scene.json"}, folder);
+  EXPECT_EQ(run.status, 0);
+  const std::vector<std::string> expected = {
+      "scene.json: settings.gravity: warning: the text \"9.8x\" is not a number; the library reads the number it "
+      "starts with, here 9.8",
+      "scene.json: frame 0: warning: 3 links do not divide evenly among 2 chains",
+      "scene.json: frame 0: warning: links of differing heights (10 and 12)",
+      "scene.json: frame 2: warning: chain 1 holds a value that is no longer finite (inf)"};
+  const std::vector<std::string> lines = Lines(run.err);
+  ASSERT_EQ(lines.size(), expected.size()) << run.err;
+  for (std::size_t i = 0; i < lines.size(); ++i) EXPECT_EQ(lines[i].substr(0, expected[i].size()), expected[i]);
+}
+
+}  // namespace
