@@ -1,17 +1,28 @@
-// Runs an arbitrary event program against one run-time object through the
-// stand-in host: objects created and destroyed, any action with any index and
-// value (infinities and NaN included), conditions, expressions and frames,
-// with further actions run from inside "On Swing". Nothing may crash, read
-// freed memory or convert a value it cannot represent.
+// Runs an arbitrary event program against one run-time object created from
+// any stored settings, through the stand-in host: objects created and
+// destroyed, any action with any index and value (infinities and NaN
+// included), conditions, expressions and frames, with further actions run
+// from inside "On Swing". Nothing may crash, read freed memory or convert a
+// value it cannot represent; an object the program never handed over is
+// never written; an expression flags a float result exactly when it gives
+// one; after a frame the lists hold only live objects.
+#include <algorithm>
 #include <bit>
 #include <cstdint>
+#include <cstdio>
+#include <cstdlib>
 #include <cstring>
 #include <vector>
 
+#include "chains/run_data.h"
 #include "frame/edit_data.h"
 #include "host.h"
 
 namespace {
+
+// A broken invariant stops the run and names itself.
+#define Check(condition) \
+  ((condition) ? (void)0 : (std::fprintf(stderr, "%s:%d: %s\n", __FILE__, __LINE__, #condition), std::abort()))
 
 class Program {
  public:
@@ -50,18 +61,35 @@ class Run {
   }
 
   void Play() {
+    const HostObject before = *bystander_;
     while (!program_.done()) Step(true);
+    Check(std::memcmp(&before, bystander_, sizeof before) == 0);
   }
 
  private:
+  // Any 100 bytes, as a damaged or hand-edited stored game may hold.
   static EditData Settings(Program& program) {
-    EditData edit{};
-    WriteEditDataDefaults(edit);
-    // Raw bytes for the four texts: the conversion must cope with any.
-    for (char* text : {edit.startAngleText, edit.massText, edit.gravityText, edit.linkSpacingText}) {
-      for (size_t i = 0; i < kSettingTextSize; ++i) text[i] = static_cast<char>(program.Byte());
-    }
+    uint8_t bytes[sizeof(EditData)];
+    for (uint8_t& byte : bytes) byte = program.Byte();
+    EditData edit;
+    std::memcpy(&edit, bytes, sizeof edit);
     return edit;
+  }
+
+  // After a frame every list element is an object the program still has.
+  void CheckListsHoldLiveObjects() {
+    RunData& rd = host_.extension();
+    const auto live = [this](const HostObject* object) {
+      return std::find(objects_.begin(), objects_.end(), object) != objects_.end();
+    };
+    for (uint32_t i = 0; i < PlatformCount(rd); ++i) Check(live(rd.platforms->At(i)));
+    for (uint32_t i = 0; i < LinkCount(rd); ++i) Check(live(rd.links->At(i)));
+    for (uint32_t i = 0; i < ChainCount(rd); ++i) Check(live(rd.chains->At(i).anchor));
+  }
+
+  void RunFrame() {
+    host_.RunFrame();
+    if (host_.created()) CheckListsHoldLiveObjects();
   }
 
   intptr_t ObjectArgument() {
@@ -96,10 +124,14 @@ class Run {
         const int code = program_.Byte() % 17;
         const int32_t first = program_.Index();
         host_.Expression(code, {first, program_.Index()});
+        // Mass, angle, speed, spacing, the deltas and the acceleration are
+        // floats; counts, coordinates and indexes are integers.
+        constexpr uint32_t kFloatCodes = 1u << 4 | 1u << 5 | 1u << 6 | 1u << 7 | 1u << 11 | 1u << 12 | 1u << 13;
+        Check(host_.lastResultWasFloat() == ((kFloatCodes >> code) & 1u));
         break;
       }
       case 4:
-        if (mayRunFrame) host_.RunFrame();
+        if (mayRunFrame) RunFrame();
         break;
       case 5:
         // A destroyed object must not be handed to the library again: the
@@ -111,13 +143,15 @@ class Run {
         }
         break;
       default:
-        for (int frames = program_.Byte() % 8; frames > 0 && mayRunFrame; --frames) host_.RunFrame();
+        for (int frames = program_.Byte() % 8; frames > 0 && mayRunFrame; --frames) RunFrame();
         break;
     }
   }
 
   Program program_;
   standin::Host host_;
+  // An object of the frame that no action is ever given.
+  HostObject* bystander_ = host_.AddObject(7, 7, 7, {7, 7});
   std::vector<HostObject*> objects_;
   int depth_ = 0;
 };

@@ -1,0 +1,150 @@
+// Calls the sixteen catalogue routines with any host version, code,
+// parameter index, menu id and buffer size (0, negative and 1 included),
+// with menus and local memory failing on demand. Text buffers sit between
+// guard bytes: a routine may write only inside the size it was given, and
+// what it writes ends inside it. Menus it hands over are real and complete;
+// a code it reports belongs to an event; an entry it describes has that code.
+#include <windows.h>
+
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <vector>
+
+#include "frame/exports.h"
+#include "frame/host_services.h"
+#include "standin_win32.h"
+
+namespace {
+
+// A broken invariant stops the run and names itself.
+#define Check(condition) \
+  ((condition) ? (void)0 : (std::fprintf(stderr, "%s:%d: %s\n", __FILE__, __LINE__, #condition), std::abort()))
+
+uint32_t g_version = 0;
+uint32_t TVCALL AnswerVersion() { return g_version; }
+
+class Input {
+ public:
+  Input(const uint8_t* data, size_t size) : data_(data), size_(size) {}
+  bool done() const { return pos_ >= size_; }
+  uint8_t Byte() { return pos_ < size_ ? data_[pos_++] : 0; }
+  int32_t Int() {
+    uint32_t value = 0;
+    for (int i = 0; i < 4; ++i) value = (value << 8) | Byte();
+    return static_cast<int32_t>(value);
+  }
+  // Mostly values near the interesting ones, sometimes any 32-bit value.
+  int32_t Near(int32_t base, int spread) {
+    const uint8_t b = Byte();
+    return b < 224 ? base + b % spread - 2 : Int();
+  }
+  // Mostly the menu ids of `count` events numbered from `first` in steps of
+  // 10, sometimes one beside them, sometimes any 32-bit value.
+  int32_t MenuId(int32_t first, int count) {
+    const uint8_t b = Byte();
+    if (b < 192) return first + 10 * (b % (count + 1));
+    return b < 224 ? first + b % 20 - 2 : Int();
+  }
+
+ private:
+  const uint8_t* data_;
+  size_t size_;
+  size_t pos_ = 0;
+};
+
+
+constexpr uint8_t kSentinel = 0xCD;
+constexpr size_t kGuard = 32;
+
+// Calls `write(buffer, size)` on a fenced buffer of max(size, 0) bytes and
+// checks the fence and the terminator.
+template <typename Write>
+void WithBuffer(int16_t size, Write write) {
+  const size_t room = size > 0 ? static_cast<size_t>(size) : 0;
+  std::vector<uint8_t> bytes(kGuard + room + kGuard, kSentinel);
+  char* buffer = reinterpret_cast<char*>(bytes.data() + kGuard);
+  write(buffer, size);
+  for (size_t i = 0; i < kGuard; ++i) Check(bytes[i] == kSentinel && bytes[kGuard + room + i] == kSentinel);
+  bool touched = false;
+  for (size_t i = 0; i < room; ++i) touched = touched || bytes[kGuard + i] != kSentinel;
+  if (touched) Check(std::memchr(buffer, '\0', room) != nullptr);
+}
+
+void CheckMenu(HMENU menu, bool compatible) {
+  if (!compatible) Check(menu == nullptr);
+  if (menu == nullptr) return;
+  Check(GetMenuItemCount(menu) > 0);
+  Check(DestroyMenu(menu) == TRUE);
+}
+
+// The menu ids of an event family run from `first` in steps of 10, in code
+// order; any other id names no event.
+template <typename Lookup>
+void CheckCode(int32_t menuId, int32_t first, int count, Lookup lookup) {
+  const int32_t offset = static_cast<int32_t>(static_cast<uint16_t>(menuId)) - first;
+  const bool named = offset >= 0 && offset % 10 == 0 && offset / 10 < count;
+  Check(lookup(menuId) == (named ? offset / 10 : -1));
+}
+
+// An entry is handed over from its code word on.
+void CheckEntry(const void* entry, int32_t code, int count) {
+  if (entry == nullptr) {
+    Check(static_cast<uint16_t>(code) >= count);
+    return;
+  }
+  uint16_t word = 0;
+  std::memcpy(&word, entry, sizeof word);
+  Check(word == static_cast<uint16_t>(code));
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+  Input in(data, size);
+  EditorHost host{};
+  const uint8_t hostKind = in.Byte();
+  if (hostKind % 4 != 0) host.slot[kEditorSlotGetVersion] = reinterpret_cast<void*>(&AnswerVersion);
+  g_version = hostKind % 4 == 1 ? (0x02000000u | 218u) : static_cast<uint32_t>(in.Int());
+  const bool compatible = host.slot[kEditorSlotGetVersion] != nullptr && (g_version & 0xFFFu) >= 218 &&
+                          (g_version & 0xFFFF0000u) >= 0x02000000u && (g_version & 0x8000u) == 0;
+  const size_t menusBefore = StandinLiveMenuCount();
+  const size_t blocksBefore = StandinLiveLocalBlockCount();
+
+  while (!in.done()) {
+    const uint8_t routine = in.Byte() % 17;
+    const int32_t code = in.Near(0, 20);
+    const auto param = static_cast<int16_t>(in.Near(0, 6));
+    const auto bufferSize = static_cast<int16_t>(in.Near(2, 40));
+    switch (routine) {
+      case 0: CheckMenu(GetConditionMenu(&host, nullptr, nullptr), compatible); break;
+      case 1: CheckMenu(GetActionMenu(&host, nullptr, nullptr), compatible); break;
+      case 2: CheckMenu(GetExpressionMenu(&host, nullptr, nullptr), compatible); break;
+      case 3: CheckCode(in.MenuId(26000, 2), 26000, 2, [&](int32_t id) { return GetConditionCodeFromMenu(&host, id); }); break;
+      case 4: CheckCode(in.MenuId(25000, 16), 25000, 16, [&](int32_t id) { return GetActionCodeFromMenu(&host, id); }); break;
+      case 5: CheckCode(in.MenuId(27000, 17), 27000, 17, [&](int32_t id) { return GetExpressionCodeFromMenu(&host, id); }); break;
+      case 6: CheckEntry(GetConditionInfos(&host, code), code, 2); break;
+      case 7: CheckEntry(GetActionInfos(&host, code), code, 16); break;
+      case 8: CheckEntry(GetExpressionInfos(&host, code), code, 17); break;
+      case 9: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetConditionTitle(&host, code, param, b, s); }); break;
+      case 10: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetActionTitle(&host, code, param, b, s); }); break;
+      case 11: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetExpressionTitle(&host, code, b, s); }); break;
+      case 12: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetExpressionParam(&host, code, param, b, s); }); break;
+      case 13: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetConditionString(&host, code, b, s); }); break;
+      case 14: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetActionString(&host, code, b, s); }); break;
+      case 15: WithBuffer(bufferSize, [&](char* b, int16_t s) { GetExpressionString(&host, code, b, s); }); break;
+      default:
+        // The next few menu or memory requests fail, as when memory runs out.
+        StandinFailCreatePopupMenu(in.Byte() % 8, in.Byte() % 3);
+        StandinFailLocalAlloc(in.Byte() % 8, in.Byte() % 3);
+        break;
+    }
+  }
+  StandinFailCreatePopupMenu(0, 0);
+  StandinFailLocalAlloc(0, 0);
+  // Every menu and block the routines made was handed over or released.
+  Check(StandinLiveMenuCount() == menusBefore);
+  Check(StandinLiveLocalBlockCount() == blocksBefore);
+  return 0;
+}

@@ -1,0 +1,93 @@
+// A scene names the library's events by the texts the event editor shows.
+// The player keeps its own table of them, so that stored scenes keep their
+// meaning; this test holds that table to what the library's catalogue says
+// (menu texts, display strings, parameter counts, object parameters and
+// titles), so a changed text in the resources cannot pass unnoticed.
+#include <gtest/gtest.h>
+#include <windows.h>
+
+#include <cstring>
+#include <map>
+#include <string>
+
+#include "catalogue/catalogue_helpers.h"
+#include "event_names.h"
+#include "frame/exports.h"
+
+namespace {
+
+using scene_player::ParamKind;
+
+// Menu texts by event code, from every item of a menu and its submenus.
+void CollectMenuTexts(HMENU menu, int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t), EditorHost& host,
+                      std::map<int, std::string>& texts) {
+  for (int position = 0; position < GetMenuItemCount(menu); ++position) {
+    if (HMENU sub = GetSubMenu(menu, position); sub != nullptr) {
+      CollectMenuTexts(sub, codeFromMenu, host, texts);
+      continue;
+    }
+    char text[256] = "";
+    GetMenuStringA(menu, static_cast<UINT>(position), text, sizeof text, MF_BYPOSITION);
+    texts[codeFromMenu(&host, static_cast<int32_t>(GetMenuItemID(menu, position)))] = text;
+  }
+}
+
+std::map<int, std::string> MenuTexts(HMENU(TVCALL* getMenu)(EditorHost*, void*, void*),
+                                     int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t)) {
+  EditorHost host = catalogue_test::CompatibleHost();
+  std::map<int, std::string> texts;
+  const HMENU menu = getMenu(&host, nullptr, nullptr);
+  CollectMenuTexts(menu, codeFromMenu, host, texts);
+  DestroyMenu(menu);
+  return texts;
+}
+
+// Entry words from the code word on: code, flags, count, types..., titles...
+uint16_t EntryWord(const void* entry, int index) {
+  uint16_t word = 0;
+  std::memcpy(&word, static_cast<const char*>(entry) + 2 * index, sizeof word);
+  return word;
+}
+
+std::string Text(const char* text) { return text == nullptr ? "<none>" : text; }
+
+TEST(SceneNames, ActionTableMatchesTheCatalogue) {
+  EditorHost host = catalogue_test::CompatibleHost();
+  auto menus = MenuTexts(&GetActionMenu, &GetActionCodeFromMenu);
+  for (int code = 0; code < scene_player::kActionNameCount; ++code) {
+    const scene_player::ActionName& name = scene_player::kActionNames[code];
+    const void* entry = GetActionInfos(&host, code);
+    ASSERT_NE(entry, nullptr) << code;
+    char display[256] = "";
+    GetActionString(&host, code, display, sizeof display);
+    std::string library = Text(menus.count(code) ? menus[code].c_str() : nullptr) + " | " + display + " |";
+    std::string player = Text(name.menuText) + " | " + name.displayText + " |";
+    const int count = EntryWord(entry, 2);
+    for (int p = 0; p < count; ++p) {
+      char title[256] = "";
+      GetActionTitle(&host, code, static_cast<int16_t>(p), title, sizeof title);
+      library += std::string(" ") + (EntryWord(entry, 3 + p) == 1 ? "object " : "value ") + title;
+    }
+    for (int p = 0; p < name.paramCount; ++p) {
+      player += std::string(" ") + (name.kinds[p] == ParamKind::Object ? "object " : "value ") + name.titles[p];
+    }
+    EXPECT_EQ(player, library) << "action " << code;
+  }
+}
+
+TEST(SceneNames, ExpressionTableMatchesTheCatalogue) {
+  EditorHost host = catalogue_test::CompatibleHost();
+  auto menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
+  for (int code = 0; code < scene_player::kExpressionNameCount; ++code) {
+    const scene_player::ExpressionName& name = scene_player::kExpressionNames[code];
+    const void* entry = GetExpressionInfos(&host, code);
+    ASSERT_NE(entry, nullptr) << code;
+    char display[256] = "";
+    GetExpressionString(&host, code, display, sizeof display);
+    EXPECT_EQ(Text(name.menuText) + " | " + name.displayText + " | " + std::to_string(name.paramCount),
+              menus[code] + " | " + display + " | " + std::to_string(EntryWord(entry, 2)))
+        << "expression " << code;
+  }
+}
+
+}  // namespace
