@@ -30,8 +30,8 @@ uint32_t Word(T value) {
 
 template <class Routine, class... Args>
 auto CallRoutine(Routine routine, Args... args) {
-  using Result = std::invoke_result_t<Routine, Args...>;
 #if defined(__i386__)
+  using Result = std::invoke_result_t<Routine, Args...>;
   const uint32_t words[] = {Word(args)...};
   int32_t unpopped = 0;
   const uint32_t eax =
