@@ -6,6 +6,7 @@ packages=(
   cmake g++ make git
   googletest libgtest-dev libgmock-dev libbenchmark-dev
   clang libclang-rt-14-dev
+  gcc-multilib g++-multilib qemu-user-static
   g++-mingw-w64-i686 g++-mingw-w64-x86-64 binutils-mingw-w64-i686 binutils-mingw-w64-x86-64
   wine wine64
   libgif-dev libpng-dev nlohmann-json3-dev

@@ -7,16 +7,28 @@
 #include <stdexcept>
 
 #include "frame/exports.h"
+#include "routine_call.h"
 
 namespace standin {
+
+namespace {
+
+// A service goes into its slot only with exactly the type the library calls
+// it with, calling convention and argument count included.
+template <class Service>
+HostServiceSlot Slot(Service service) {
+  return reinterpret_cast<HostServiceSlot>(service);
+}
+
+}  // namespace
 
 Host::Host(const EditData& settings) {
   context_.host = this;
   auto& slots = context_.services.slot;
-  slots[kSlotGenerateEvent] = reinterpret_cast<HostServiceSlot>(&GenerateEvent);
-  slots[kSlotGetFirstExpressionParameter] = reinterpret_cast<HostServiceSlot>(&GetFirstParameter);
-  slots[kSlotGetNextExpressionParameter] = reinterpret_cast<HostServiceSlot>(&GetNextParameter);
-  slots[kSlotGetFloatParameter] = reinterpret_cast<HostServiceSlot>(&GetFloatParameter);
+  slots[kSlotGenerateEvent] = Slot<HostGenerateEventFn>(&GenerateEvent);
+  slots[kSlotGetFirstExpressionParameter] = Slot<HostGetExpressionParameterFn>(&GetFirstParameter);
+  slots[kSlotGetNextExpressionParameter] = Slot<HostGetExpressionParameterFn>(&GetNextParameter);
+  slots[kSlotGetFloatParameter] = Slot<HostGetFloatParameterFn>(&GetFloatParameter);
 
   GetRunObjectInfos(nullptr, &info_);
   EditData edit = settings;
@@ -73,7 +85,7 @@ int16_t Host::Action(int code, intptr_t param1, intptr_t param2, float floatValu
   if (code < 0 || code >= info_.actionCount) throw std::out_of_range("no such action");
   const float saved = floatParameter_;  // actions may run inside another's event
   floatParameter_ = floatValue;
-  const int16_t result = info_.actionRoutines[code](extension_, param1, param2);
+  const int16_t result = CallRoutine(info_.actionRoutines[code], extension_, param1, param2);
   floatParameter_ = saved;
   return result;
 }
@@ -87,7 +99,7 @@ int16_t Host::ActionWithValue(int code, int32_t index, float value) {
 
 int32_t Host::Condition(int code, intptr_t param1, intptr_t param2) {
   if (code < 0 || code >= info_.conditionCount) throw std::out_of_range("no such condition");
-  return info_.conditionRoutines[code](extension_, param1, param2);
+  return CallRoutine(info_.conditionRoutines[code], extension_, param1, param2);
 }
 
 int32_t Host::Expression(int code, std::initializer_list<int32_t> params) {
@@ -97,7 +109,7 @@ int32_t Host::Expression(int code, std::initializer_list<int32_t> params) {
   parameters_.assign(params.begin(), params.end());
   nextParameter_ = 0;
   extension_->head.flags &= static_cast<uint16_t>(~kFlagFloatResult);
-  const int32_t result = info_.expressionRoutines[code](extension_, reinterpret_cast<intptr_t>(this));
+  const int32_t result = CallRoutine(info_.expressionRoutines[code], extension_, reinterpret_cast<intptr_t>(this));
   lastResultWasFloat_ = (extension_->head.flags & kFlagFloatResult) != 0;
   parameters_ = savedParameters;
   nextParameter_ = savedNext;

@@ -5,9 +5,15 @@
 
 #include <cstdint>
 
+// The Win32 convention: __stdcall on 32-bit x86, as USER32 and the callbacks
+// it calls (dialog procedures) have it; the default convention on 64-bit.
+#if defined(__i386__)
+#define WINAPI __attribute__((stdcall))
+#else
 #define WINAPI
-#define APIENTRY
-#define CALLBACK
+#endif
+#define APIENTRY WINAPI
+#define CALLBACK WINAPI
 
 typedef int BOOL;
 typedef unsigned char BYTE;
