@@ -5,6 +5,7 @@
 // screen: the author a test installs acts once the dialog is up.
 #include <cstdio>
 #include <cstdlib>
+#include <new>
 #include <unordered_map>
 #include <utility>
 
@@ -66,30 +67,37 @@ bool ControlKind(const DialogItemTemplate& item, WindowKind& kind) {
   }
 }
 
-// The dialog and its controls, hidden; null when a control cannot be made.
+// The dialog and its controls, hidden; null when a control cannot be made
+// or memory runs out.
 HWND CreateDialogWindows(const DialogTemplate& dialogTemplate, HWND owner, DLGPROC proc) {
-  Window dialog;
-  dialog.kind = WindowKind::Dialog;
-  dialog.parent = owner;
-  dialog.style = dialogTemplate.style;
-  dialog.text = dialogTemplate.caption;
-  dialog.proc = proc;
-  const HWND handle = NewWindow(std::move(dialog));
-  for (const DialogItemTemplate& item : dialogTemplate.items) {
-    Window control;
-    if (!ControlKind(item, control.kind)) {
-      DestroyDialog(handle);
-      return nullptr;
+  HWND handle = nullptr;
+  try {
+    Window dialog;
+    dialog.kind = WindowKind::Dialog;
+    dialog.parent = owner;
+    dialog.style = dialogTemplate.style;
+    dialog.text = dialogTemplate.caption;
+    dialog.proc = proc;
+    handle = NewWindow(std::move(dialog));
+    for (const DialogItemTemplate& item : dialogTemplate.items) {
+      Window control;
+      if (!ControlKind(item, control.kind)) {
+        DestroyDialog(handle);
+        return nullptr;
+      }
+      control.parent = handle;
+      control.id = item.id;
+      control.style = item.style;
+      control.text = item.title.isOrdinal ? std::string() : item.title.text;
+      const HWND controlHandle = NewWindow(std::move(control));
+      Window* window = FindWindowOf(handle);
+      window->controls.push_back(controlHandle);
+      // The last default push button made is the dialog's default.
+      if (FindWindowOf(controlHandle)->kind == WindowKind::DefPushButton) window->defaultId = item.id;
     }
-    control.parent = handle;
-    control.id = item.id;
-    control.style = item.style;
-    control.text = item.title.isOrdinal ? std::string() : item.title.text;
-    const HWND controlHandle = NewWindow(std::move(control));
-    Window* window = FindWindowOf(handle);
-    window->controls.push_back(controlHandle);
-    // The last default push button made is the dialog's default.
-    if (FindWindowOf(controlHandle)->kind == WindowKind::DefPushButton) window->defaultId = item.id;
+  } catch (const std::bad_alloc&) {
+    if (handle != nullptr) DestroyDialog(handle);
+    return nullptr;
   }
   return handle;
 }
@@ -121,10 +129,11 @@ Window* FindWindowOf(HWND handle) {
 }
 
 void DestroyDialog(HWND dialog) {
-  if (Window* window = FindWindowOf(dialog)) {
-    for (HWND control : window->controls) DeleteWindow(control);
+  for (auto it = Windows().begin(); it != Windows().end();) {
+    const bool ofDialog = it->first == reinterpret_cast<uintptr_t>(dialog) || it->second.parent == dialog;
+    if (ofDialog && g_focus == reinterpret_cast<HWND>(it->first)) g_focus = nullptr;
+    it = ofDialog ? Windows().erase(it) : std::next(it);
   }
-  DeleteWindow(dialog);
 }
 
 HWND DialogItem(HWND dialog, int id) {
@@ -153,7 +162,11 @@ INT_PTR WINAPI DialogBoxParamA(HINSTANCE hInstance, LPCSTR lpTemplateName, HWND 
   // USER32 makes no dialog for an owner that is not a window, and says 0.
   if (hWndParent != nullptr && !IsWindow(hWndParent)) return 0;
   standin::DialogTemplate dialogTemplate;
-  if (!standin::ReadDialogTemplate(entry->data, entry->size, dialogTemplate)) return -1;
+  try {
+    if (!standin::ReadDialogTemplate(entry->data, entry->size, dialogTemplate)) return -1;
+  } catch (const std::bad_alloc&) {
+    return -1;
+  }
   const HWND dialog = standin::CreateDialogWindows(dialogTemplate, hWndParent, lpDialogFunc);
   if (dialog == nullptr) return -1;
 

@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <cstdio>
 #include <cstring>
+#include <new>
 
 #include "standin_win32.h"
 #include "window_store.h"
@@ -21,8 +22,10 @@ bool IsButton(WindowKind kind) {
   return IsCheckBox(kind) || kind == WindowKind::PushButton || kind == WindowKind::DefPushButton;
 }
 
-void Notify(HWND control, const Window& window, WORD code) {
-  SendMessageA(window.parent, WM_COMMAND, MAKEWPARAM(window.id, code), reinterpret_cast<LPARAM>(control));
+// Tells the control's dialog; the dialog may change or close meanwhile, so
+// the control's parent and id are taken beforehand.
+void Notify(HWND control, HWND dialog, int id, WORD code) {
+  SendMessageA(dialog, WM_COMMAND, MAKEWPARAM(id, code), reinterpret_cast<LPARAM>(control));
 }
 
 // Copies at most size - 1 characters and a terminator; the count copied.
@@ -38,7 +41,11 @@ LRESULT CopyText(const std::string& text, WPARAM size, LPARAM buffer) {
 LRESULT TextMessage(Window& window, UINT Msg, WPARAM wParam, LPARAM lParam) {
   switch (Msg) {
     case WM_SETTEXT:
-      window.text = lParam == 0 ? "" : reinterpret_cast<const char*>(lParam);
+      try {
+        window.text = lParam == 0 ? "" : reinterpret_cast<const char*>(lParam);
+      } catch (const std::bad_alloc&) {
+        return FALSE;  // out of memory: the text stays as it was
+      }
       return TRUE;
     case WM_GETTEXT: return CopyText(window.text, wParam, lParam);
     case WM_GETTEXTLENGTH: return static_cast<LRESULT>(window.text.size());
@@ -63,11 +70,12 @@ LRESULT DialogMessage(HWND hWnd, const Window& window, UINT Msg, WPARAM wParam, 
 LRESULT ControlMessage(HWND hWnd, Window& window, UINT Msg, WPARAM wParam, LPARAM lParam) {
   switch (Msg) {
     case WM_SETTEXT: {
-      TextMessage(window, Msg, wParam, lParam);
+      if (!TextMessage(window, Msg, wParam, lParam)) return FALSE;
       if (window.kind == WindowKind::Edit) {
-        const Window copy = window;  // the dialog may change or close while it is notified
-        Notify(hWnd, copy, EN_UPDATE);
-        Notify(hWnd, copy, EN_CHANGE);
+        const HWND dialog = window.parent;
+        const int id = window.id;
+        Notify(hWnd, dialog, id, EN_UPDATE);
+        Notify(hWnd, dialog, id, EN_CHANGE);
       }
       return TRUE;
     }
@@ -79,8 +87,7 @@ LRESULT ControlMessage(HWND hWnd, Window& window, UINT Msg, WPARAM wParam, LPARA
       if (!IsButton(window.kind)) return 0;
       standin::SetFocusTo(hWnd);
       if (window.kind == WindowKind::AutoCheckBox) window.check = window.check == BST_CHECKED ? 0 : BST_CHECKED;
-      const Window copy = window;
-      Notify(hWnd, copy, BN_CLICKED);
+      Notify(hWnd, window.parent, window.id, BN_CLICKED);
       return 0;
     }
     default: return TextMessage(window, Msg, wParam, lParam);
