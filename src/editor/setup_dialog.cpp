@@ -62,7 +62,7 @@ void StoreSettings(HWND dialog, EditData& edit) {
 INT_PTR CALLBACK SetupDialogProc(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) noexcept {
   if (message == WM_INITDIALOG) {
     SetWindowLongPtrA(dialog, DWLP_USER, lParam);
-    ShowSettings(dialog, *reinterpret_cast<SetupDialogContext*>(lParam)->edit);
+    if (const auto* context = reinterpret_cast<SetupDialogContext*>(lParam)) ShowSettings(dialog, *context->edit);
     return TRUE;  // the focus goes to the first control with a tab stop
   }
   if (message != WM_COMMAND) return FALSE;
