@@ -27,6 +27,7 @@
 
 /* The setup dialog and its controls. */
 #define IDD_SETUP 20003
+#define IDC_NO_ID 65535 /* a control without an id of its own */
 #define IDC_START_ANGLE 1001
 #define IDC_MASS 1002
 #define IDC_LINK_SPACING 1003

@@ -1,7 +1,7 @@
-// FindResourceA, LoadResource, LockResource and FreeResource over the
-// library's embedded resources. An HRSRC is the entry's position plus one
-// and a loaded resource is the address of its data, as on Windows, where
-// LockResource only hands that address back.
+// FindResourceA, LoadResource, LockResource, SizeofResource and FreeResource
+// over the library's embedded resources. An HRSRC is the entry's position
+// plus one and a loaded resource is the address of its data, as on Windows,
+// where LockResource only hands that address back.
 #include "resource_image.h"
 #include "standin_win32.h"
 
@@ -34,6 +34,11 @@ LPVOID WINAPI LockResource(HGLOBAL hResData) {
     if (entry.data == hResData) return hResData;
   }
   return nullptr;
+}
+
+DWORD WINAPI SizeofResource(HMODULE hModule, HRSRC hResInfo) {
+  const standin::ResourceEntry* entry = EntryOf(hResInfo);
+  return hModule != StandinLibraryModule() || entry == nullptr ? 0 : entry->size;
 }
 
 // Resources stay mapped with their module; releasing one is a no-op that

@@ -1,0 +1,194 @@
+// The setup dialog as the author sees and works it, opened by CreateObject
+// and SelectPopup. The same tests run against the Win32 stand-in and, in
+// the Windows test build, against real USER32.
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <string>
+#include <vector>
+
+#include "catalogue/catalogue_helpers.h"
+#include "dialog_author.h"
+#include "frame/edit_data.h"
+#include "frame/exports.h"
+#include "resources/resource_ids.h"
+
+namespace {
+
+using editor_test::ReadText;
+using editor_test::WithAuthor;
+
+// A record the host has just made: its own header and the fill bytes hold
+// a pattern that nothing of ours may change.
+EditData FreshRecord() {
+  EditData edit;
+  std::memset(&edit, 0xA5, sizeof edit);
+  return edit;
+}
+
+void SetText(char (&field)[kSettingTextSize], const char* text) {
+  std::memset(field, 0, sizeof field);
+  std::memcpy(field, text, std::strlen(text));
+}
+
+// A fresh record with every default of a new object.
+EditData Defaults() {
+  EditData edit = FreshRecord();
+  edit.reserved20 = edit.reserved22 = 0;
+  edit.objectWidth = edit.objectHeight = 32;
+  SetText(edit.startAngleText, "90");
+  SetText(edit.massText, "1");
+  SetText(edit.gravityText, "9.81");
+  SetText(edit.linkSpacingText, "0");
+  edit.anchorWidth = edit.anchorHeight = 32;
+  edit.platformWidth = 64;
+  edit.platformHeight = 32;
+  edit.linkWidth = edit.linkHeight = 32;
+  edit.linkCount = 10;
+  edit.viewTemplate = 0;
+  return edit;
+}
+
+bool SameBytes(const EditData& a, const EditData& b) { return std::memcmp(&a, &b, sizeof a) == 0; }
+
+// Every control that shows a setting, with what it shows: "1001=90 ... box=0".
+std::string Shown(HWND dialog) {
+  std::string shown;
+  for (int id = IDC_START_ANGLE; id <= IDC_LINK_COUNT; ++id) {
+    shown += std::to_string(id) + "=" + ReadText(dialog, id) + " ";
+  }
+  return shown + "box=" + std::to_string(IsDlgButtonChecked(dialog, IDC_VIEW_TEMPLATE));
+}
+const std::string kDefaultsShown =
+    "1001=90 1002=1 1003=0 1004=9.81 1005=64 1006=32 1007=32 1008=32 1009=32 1010=32 1011=10 box=0";
+
+enum class Press { Ok, Enter, Cancel, Escape, Help };
+
+void Do(HWND dialog, Press press) {
+  switch (press) {
+    case Press::Ok: editor_test::Click(dialog, IDOK); break;
+    case Press::Enter: editor_test::PressKey(dialog, VK_RETURN); break;
+    case Press::Cancel: editor_test::Click(dialog, IDCANCEL); break;
+    case Press::Escape: editor_test::PressKey(dialog, VK_ESCAPE); break;
+    case Press::Help: editor_test::Click(dialog, IDC_SETUP_HELP); break;
+  }
+}
+
+// The author reads what is shown, then presses each of `presses` in turn;
+// every press but the last leaves the dialog open.
+editor_test::Author ReadThenPress(std::string& shown, std::vector<Press> presses) {
+  return [&shown, presses](HWND dialog) {
+    shown = Shown(dialog);
+    for (std::size_t i = 0; i < presses.size(); ++i) {
+      Do(dialog, presses[i]);
+      if (i + 1 < presses.size()) {
+        EXPECT_TRUE(IsWindowVisible(dialog)) << "press " << i;
+      }
+    }
+  };
+}
+
+TEST(SetupDialog, NewObjectShowsTheDefaultsAndKeepsThemWhateverEndsIt) {
+  const struct {
+    std::vector<Press> presses;
+    int32_t result;
+  } endings[] = {{{Press::Cancel}, -1},
+                 {{Press::Escape}, -1},
+                 {{Press::Ok}, 0},
+                 {{Press::Enter}, 0},
+                 {{Press::Help, Press::Help, Press::Enter}, 0},
+                 {{Press::Help, Press::Cancel}, -1}};
+  for (const auto& ending : endings) {
+    EditorHost host = catalogue_test::CompatibleHost();
+    EditData edit = FreshRecord();
+    std::string shown;
+    int32_t result = 99;
+    EXPECT_EQ(WithAuthor(ReadThenPress(shown, ending.presses), [&] { result = CreateObject(&host, nullptr, &edit); }),
+              1);
+    EXPECT_EQ(shown, kDefaultsShown);
+    EXPECT_EQ(result, ending.result) << ending.presses.size() << " presses";
+    EXPECT_TRUE(SameBytes(edit, Defaults())) << ending.presses.size() << " presses";
+  }
+}
+
+TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
+  EditorHost host = catalogue_test::CompatibleHost();
+  EditData edit = FreshRecord();
+  const auto typeAndOk = [](HWND dialog) {
+    const std::pair<int, const char*> typed[] = {
+        {IDC_MASS, "123456789012"}, {IDC_START_ANGLE, "45"}, {IDC_ANCHOR_WIDTH, "abc"},
+        {IDC_PLATFORM_HEIGHT, ""},  {IDC_LINK_COUNT, "-5"}};
+    for (const auto& [id, text] : typed) editor_test::Type(dialog, id, text);
+    editor_test::Click(dialog, IDC_VIEW_TEMPLATE);
+    editor_test::Click(dialog, IDOK);
+  };
+  int32_t result = 99;
+  WithAuthor(typeAndOk, [&] { result = CreateObject(&host, nullptr, &edit); });
+  EXPECT_EQ(result, 0);
+
+  EditData expected = Defaults();
+  SetText(expected.massText, "123456789");  // twelve digits cut to nine
+  SetText(expected.startAngleText, "45");
+  expected.anchorWidth = 0;  // letters
+  expected.platformHeight = 0;  // empty
+  expected.linkCount = -5;
+  expected.viewTemplate = 1;
+  EXPECT_TRUE(SameBytes(edit, expected));
+
+  // A stored text that fills its ten bytes is shown as those ten, no more.
+  std::memset(edit.linkSpacingText, 'y', kSettingTextSize);
+  const EditData before = edit;
+  std::string shown;
+  EXPECT_EQ(WithAuthor(ReadThenPress(shown, {Press::Cancel}),
+                       [&] { result = SelectPopup(&host, 2020, nullptr, nullptr, &edit, nullptr, nullptr); }),
+            1);
+  EXPECT_EQ(shown, "1001=45 1002=123456789 1003=yyyyyyyyyy 1004=9.81 1005=64 1006=0 1007=32 1008=32 1009=0 "
+                   "1010=32 1011=-5 box=1");
+  EXPECT_EQ(result, 0);
+  EXPECT_TRUE(SameBytes(edit, before));
+}
+
+TEST(SetupDialog, PopupOpensOnlyForItsCommandAndAnswersFourAfterOk) {
+  const struct {
+    int32_t command;
+    Press press;
+    int shown;
+    int32_t result;
+  } cases[] = {{2020, Press::Ok, 1, 4},     {2020, Press::Enter, 1, 4}, {2020, Press::Cancel, 1, 0},
+               {2020, Press::Escape, 1, 0}, {2021, Press::Ok, 0, 0},    {0, Press::Ok, 0, 0}};
+  for (const auto& c : cases) {
+    EditorHost host = catalogue_test::CompatibleHost();
+    EditData edit = Defaults();
+    edit.linkCount = -7;
+    const EditData before = edit;
+    std::string shown;
+    int32_t result = 99;
+    EXPECT_EQ(WithAuthor(ReadThenPress(shown, {c.press}),
+                         [&] { result = SelectPopup(&host, c.command, nullptr, nullptr, &edit, nullptr, nullptr); }),
+              c.shown)
+        << c.command;
+    EXPECT_EQ(result, c.result) << c.command;
+    // OK stores back exactly what was shown.
+    EXPECT_TRUE(SameBytes(edit, before)) << c.command;
+  }
+}
+
+TEST(SetupDialog, IncompatibleHostGetsNoDialogAndNothingWritten) {
+  // 0: no version service at all; then build 217, version 1.FF, the 0x8000 flag.
+  const uint32_t versions[] = {0, 0x02000000u | 217u, 0x01FF0000u | 218u, 0x02000000u | 0x8000u | 218u};
+  for (uint32_t version : versions) {
+    EditorHost host = version == 0 ? EditorHost{} : catalogue_test::HostWithVersion(version);
+    EditData edit = FreshRecord();
+    int32_t created = 99, selected = 99;
+    const int shown = WithAuthor([](HWND dialog) { editor_test::Click(dialog, IDOK); }, [&] {
+      created = CreateObject(&host, nullptr, &edit);
+      selected = SelectPopup(&host, 2020, nullptr, nullptr, &edit, nullptr, nullptr);
+    });
+    EXPECT_EQ(shown, 0) << std::hex << version;
+    EXPECT_EQ(created, -1) << std::hex << version;
+    EXPECT_EQ(selected, 0) << std::hex << version;
+    EXPECT_TRUE(SameBytes(edit, FreshRecord())) << std::hex << version;
+  }
+}
+
+}  // namespace
