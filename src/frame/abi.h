@@ -14,6 +14,14 @@
 #define TAVRIN_EXPORT extern "C" __attribute__((visibility("default")))
 #endif
 
+// Operations of a host class called on an object (the object in ECX, callee
+// pops the rest) on 32-bit x86; the platform's one convention elsewhere.
+#if defined(__i386__)
+#define TVTHISCALL __attribute__((thiscall))  // __thiscall, spelled so that Linux GCC knows it too
+#else
+#define TVTHISCALL
+#endif
+
 #if defined(_WIN32) && !defined(_WIN64)
 #define TAVRIN_I686 1
 #else
