@@ -51,7 +51,10 @@ dravo2::Canvas* CanvasOf(const HostSurface* surface) {
 
 std::string Numbers(std::initializer_list<long long> values) {
   std::string text;
-  for (const long long value : values) text += " " + std::to_string(value);
+  for (const long long value : values) {
+    text += ' ';
+    text += std::to_string(value);
+  }
   return text;
 }
 
