@@ -1,0 +1,134 @@
+// What the frame editor shows of the object: its picture, or a preview of one
+// chain built from the template sizes of the setup dialog.
+#include <cmath>
+#include <cstdio>
+
+#include "chains/float_math.h"
+#include "editor/drawing_services.h"
+#include "frame/edit_data.h"
+#include "frame/exports.h"
+#include "frame/host_services.h"
+#include "frame/module.h"
+#include "frame/setting_text.h"
+#include "resources/resource_ids.h"
+
+namespace {
+
+// 3.14159 / 180, the degree factor of the run-time chains: the preview puts
+// the platform where a chain with these settings would hang.
+constexpr double kDegree = 0.017453277777777776;
+
+// A stored record may hold any 32-bit sizes. The host works them out in
+// 32-bit registers, where sums and products wrap; unsigned arithmetic gives
+// the same bits without signed overflow.
+int32_t Add(int32_t a, int32_t b) { return static_cast<int32_t>(static_cast<uint32_t>(a) + static_cast<uint32_t>(b)); }
+int32_t Sub(int32_t a, int32_t b) { return static_cast<int32_t>(static_cast<uint32_t>(a) - static_cast<uint32_t>(b)); }
+int32_t Mul(int32_t a, int32_t b) { return static_cast<int32_t>(static_cast<uint32_t>(a) * static_cast<uint32_t>(b)); }
+int32_t Half(int32_t value) { return value / 2; }  // toward zero; never overflows
+
+// A setting text read as the run-time object reads it, truncated toward zero.
+// Beyond the int32 range (a text such as "1e999") it saturates.
+int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
+  return TruncateToInt(ParseDecimalPrefix(text, kSettingTextSize), 0);
+}
+
+// cx + R cos(angle) or cy + R sin(angle), saturated as above when R is huge.
+int32_t OnArc(int32_t centre, int32_t radius, double trig) {
+  return TruncateToInt(static_cast<double>(radius) * trig + static_cast<double>(centre), 0);
+}
+
+RECT MakeRect(int32_t left, int32_t top, int32_t right, int32_t bottom) {
+  RECT rect{};
+  rect.left = left;
+  rect.top = top;
+  rect.right = right;
+  rect.bottom = bottom;
+  return rect;
+}
+
+void DrawRectangle(HostSurface* surface, int32_t x1, int32_t y1, int32_t x2, int32_t y2) {
+  HostSurfaceRectangle(surface, x1, y1, x2, y2, 255, 0, 0, 1);
+}
+
+void DrawLabel(HostSurface* surface, int32_t shownX, int32_t shownY, RECT rect) {
+  // Two signed 32-bit numbers, a comma and two brackets: at most 25
+  // characters, so the text always fits with its terminator.
+  char text[26];
+  std::snprintf(text, sizeof text, "(%i,%i)", static_cast<int>(shownX), static_cast<int>(shownY));
+  HostSurfaceDrawText(surface, text, -1, &rect, 1, 0, 0, 1, 0, 0, 0, 0, 0, 8);
+}
+
+// Bitmap 401 at the object's top-left corner, through a scratch surface that
+// lives in this routine's storage. The surface is created 4 by 4; the load
+// service takes the bitmap's own size.
+void DrawPicture(HostSurface* editor, int32_t left, int32_t top) {
+  alignas(kScratchSurfaceAlign) unsigned char storage[kScratchSurfaceBytes];
+  auto* scratch = reinterpret_cast<HostSurface*>(storage);
+  HostSurfaceConstruct(scratch);
+  HostSurfaceCreate(scratch, 4, 4, editor);
+  HostSurfaceLoadBitmap(scratch, TavrinModule(), IDB_PICTURE, 1);
+  HostSurfaceBlit(scratch, editor, left, top, 1, 0, 0, 0);
+  HostSurfaceDestruct(scratch);
+}
+
+// The anchor at the centre of the object's area and the platform at three
+// places on its arc: swung by -A, hanging straight down, swung by +A.
+void DrawTemplate(HostSurface* editor, const EditData& edit, const RECT& rect, int32_t radius, int32_t angle) {
+  const auto left = static_cast<int32_t>(rect.left);
+  const auto top = static_cast<int32_t>(rect.top);
+  const int32_t cx = Add(left, Half(Sub(static_cast<int32_t>(rect.right), left)));
+  const int32_t cy = Add(top, Half(Sub(static_cast<int32_t>(rect.bottom), top)));
+
+  const int32_t anchorLeft = Sub(cx, Half(edit.anchorWidth));
+  const int32_t anchorTop = Sub(cy, Half(edit.anchorHeight));
+  DrawRectangle(editor, anchorLeft, anchorTop, Add(cx, Half(edit.anchorWidth)), Add(cy, Half(edit.anchorHeight)));
+  // The anchor's label shows its top-left corner and starts there.
+  DrawLabel(editor, anchorLeft, anchorTop,
+            MakeRect(anchorLeft, anchorTop, Add(anchorLeft, Mul(2, edit.anchorWidth)),
+                     Add(anchorTop, Mul(2, edit.anchorHeight))));
+
+  int32_t theta = Sub(90, angle);
+  for (int i = 0; i < 3; ++i, theta = Add(theta, angle)) {
+    const double radians = static_cast<double>(theta) * kDegree;
+    const int32_t px = OnArc(cx, radius, std::cos(radians));
+    const int32_t py = OnArc(cy, radius, std::sin(radians));
+    const int32_t platformTop = Sub(py, Half(edit.platformHeight));
+    DrawRectangle(editor, Sub(px, Half(edit.platformWidth)), platformTop, Add(px, Half(edit.platformWidth)),
+                  Add(py, Half(edit.platformHeight)));
+    // A platform's label shows its centre, in a rectangle centred on px and
+    // twice the platform's width wide.
+    DrawLabel(editor, px, py,
+              MakeRect(Sub(px, edit.platformWidth), platformTop, Add(px, edit.platformWidth),
+                       Add(platformTop, Mul(2, edit.platformHeight))));
+  }
+}
+
+}  // namespace
+
+TAVRIN_EXPORT void TVCALL EditorDisplay(EditorHost* host, void*, void* placed, EditData* edit, RECT* rect) {
+  void* const window = host->slot[kEditorSlotEditorWindow];
+  HostSurface* const editor = HostGetEditorSurface(window, 0);
+  if (editor == nullptr) return;
+
+  const int32_t spacing = SettingInteger(edit->linkSpacingText);
+  const int32_t angle = SettingInteger(edit->startAngleText);
+  // Each link adds its height and the spacing; there is one step more than links.
+  const int32_t radius = Mul(Add(edit->linkHeight, spacing), Add(edit->linkCount, 1));
+
+  // The sizes are 16-bit fields and keep the low 16 bits.
+  if (edit->viewTemplate == 1) {
+    edit->objectWidth = static_cast<int16_t>(Add(edit->platformWidth, Mul(2, radius)));
+    edit->objectHeight = static_cast<int16_t>(Add(edit->platformHeight, Mul(2, radius)));
+  } else if (edit->viewTemplate == 0) {
+    edit->objectWidth = 32;
+    edit->objectHeight = 32;
+  }
+  GetObjectRect(host, rect, placed, edit);
+
+  if (edit->viewTemplate == 0) {
+    DrawPicture(editor, static_cast<int32_t>(rect->left), static_cast<int32_t>(rect->top));
+  } else if (edit->viewTemplate == 1) {
+    DrawTemplate(editor, *edit, *rect, radius, angle);
+    HostUpdateEditorRect(window, rect);
+  }
+}

@@ -1,0 +1,167 @@
+// What the library asks the frame editor to draw, observed through the
+// drawing service calls it makes: natively through the DRAVO2 stand-in it
+// is linked against, under Wine through the stand-in DRAVO2.dll, whose
+// ordinals the Windows loader resolves.
+#include <gtest/gtest.h>
+
+#include <climits>
+#include <cstring>
+#include <string>
+#include <vector>
+
+#include "editor_window.h"
+#include "frame/edit_data.h"
+#include "frame/exports.h"
+
+namespace {
+
+using Calls = std::vector<std::string>;
+
+EditData Defaults(uint8_t viewTemplate) {
+  EditData edit{};
+  WriteEditDataDefaults(edit);
+  edit.viewTemplate = viewTemplate;
+  return edit;
+}
+
+RECT Place(int32_t left, int32_t top) {
+  RECT rect{};
+  rect.left = left;
+  rect.top = top;
+  rect.right = rect.bottom = 12345;  // filled by the routine, or left alone
+  return rect;
+}
+
+Calls Display(EditorHost* host, EditData& edit, RECT& rect) {
+  standin::EditorWindow window(8, 8);
+  EditorHost* const record = host != nullptr ? host : window.host();
+  char placed[64] = {};
+  EditorDisplay(record, nullptr, placed, &edit, &rect);
+  return window.TakeCalls();
+}
+
+// The text of each label drawn, in drawing order.
+std::vector<std::string> Labels(const Calls& calls) {
+  std::vector<std::string> labels;
+  for (const std::string& call : calls) {
+    if (call.rfind("DrawText editor \"", 0) == 0) {
+      const std::size_t start = call.find('"') + 1;
+      labels.push_back(call.substr(start, call.find('"', start) - start));
+    }
+  }
+  return labels;
+}
+
+TEST(EditorDisplay, ShowsThePictureAtTheObjectsCornerThroughAScratchSurface) {
+  EditData edit = Defaults(0);
+  edit.objectWidth = 5;
+  RECT rect = Place(10, 20);
+  EXPECT_EQ(Display(nullptr, edit, rect), (Calls{
+      "GetEditorSurface window 0",
+      "Construct scratch",
+      "Create scratch 4 4 editor",
+      "LoadBitmap scratch 401 1 -> 32x32",
+      "Blit scratch editor 10 20 1 0 0 0",
+      "Destruct scratch",
+  }));
+  EXPECT_EQ(edit.objectWidth, 32);
+  EXPECT_EQ(edit.objectHeight, 32);
+  EXPECT_EQ(rect.right, 42);
+  EXPECT_EQ(rect.bottom, 52);
+}
+
+TEST(EditorDisplay, DrawsTheTemplateOfTheDefaults) {
+  EditData edit = Defaults(1);
+  RECT rect = Place(0, 0);
+  const std::string args = " 1 0 0 1 0 0 0 0 0 8";
+  EXPECT_EQ(Display(nullptr, edit, rect), (Calls{
+      "GetEditorSurface window 0",
+      "Rectangle editor 368 352 400 384 255 0 0 1",
+      "DrawText editor \"(368,352)\" -1 368 352 432 416" + args,
+      "Rectangle editor 704 352 768 384 255 0 0 1",
+      "DrawText editor \"(736,368)\" -1 672 352 800 416" + args,
+      // The sine of 90 degrees with the chains' degree factor falls just short of 1.
+      "Rectangle editor 352 703 416 735 255 0 0 1",
+      "DrawText editor \"(384,719)\" -1 320 703 448 767" + args,
+      "Rectangle editor 0 352 64 384 255 0 0 1",
+      "DrawText editor \"(32,368)\" -1 -32 352 96 416" + args,
+      "UpdateEditorRect window 0 0 768 736",
+  }));
+  EXPECT_EQ(edit.objectWidth, 768);
+  EXPECT_EQ(edit.objectHeight, 736);
+}
+
+TEST(EditorDisplay, TemplateSettingsSetTheRadiusAndTheSwing) {
+  struct Case {
+    const char* angle;
+    const char* spacing;
+    int32_t links;
+    int16_t width, height;
+    std::vector<std::string> labels;  // the anchor's, then the three platforms'
+  };
+  const Case cases[] = {
+      {"30", "0", 10, 768, 736, {"(368,352)", "(560,672)", "(384,719)", "(208,672)"}},
+      {"0", "0", 10, 768, 736, {"(368,352)", "(384,719)", "(384,719)", "(384,719)"}},
+      {"45.9", "0", 10, 768, 736, {"(368,352)", "(632,616)", "(384,719)", "(135,616)"}},
+      {"-30.7", "0", 10, 768, 736, {"(368,352)", "(208,672)", "(384,719)", "(560,672)"}},
+      {"90", "2.9", 10, 812, 780, {"(390,374)", "(780,390)", "(406,763)", "(32,390)"}},
+      {"90", "0", 0, 128, 96, {"(48,32)", "(96,48)", "(64,79)", "(32,48)"}},
+      // Not a number: no swing and no spacing.
+      {"abc", "x", 10, 768, 736, {"(368,352)", "(384,719)", "(384,719)", "(384,719)"}},
+  };
+  for (const Case& c : cases) {
+    SCOPED_TRACE(std::string(c.angle) + " / " + c.spacing + " / " + std::to_string(c.links));
+    EditData edit = Defaults(1);
+    std::strcpy(edit.startAngleText, c.angle);
+    std::strcpy(edit.linkSpacingText, c.spacing);
+    edit.linkCount = c.links;
+    RECT rect = Place(0, 0);
+    EXPECT_EQ(Labels(Display(nullptr, edit, rect)), c.labels);
+    EXPECT_EQ(edit.objectWidth, c.width);
+    EXPECT_EQ(edit.objectHeight, c.height);
+  }
+}
+
+TEST(EditorDisplay, DrawsNothingWithoutASurfaceOrATemplateChoice) {
+  struct Case {
+    const char* name;
+    bool surface;
+    uint8_t viewTemplate;
+    LONG right;  // the rectangle is filled only once there is a surface
+  };
+  const Case cases[] = {{"no editor surface", false, 1, 12345}, {"view template 2", true, 2, 110 + 70}};
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.name);
+    EditData edit = Defaults(c.viewTemplate);
+    edit.objectWidth = 70;
+    edit.objectHeight = 50;
+    EditorHost noWindow{};
+    RECT rect = Place(110, 20);
+    EXPECT_EQ(Display(c.surface ? nullptr : &noWindow, edit, rect),
+              Calls{std::string("GetEditorSurface ") + (c.surface ? "window" : "null") + " 0"});
+    EXPECT_EQ(edit.objectWidth, 70);
+    EXPECT_EQ(edit.objectHeight, 50);
+    EXPECT_EQ(rect.right, c.right);
+  }
+}
+
+// Sizes at the ends of the 32-bit range wrap as the host's arithmetic does,
+// and a starting angle beyond every integer saturates: the sanitizers see no
+// overflow and every label fits its buffer.
+TEST(EditorDisplay, ExtremeSettingsWrapAndSaturate) {
+  EditData edit = Defaults(1);
+  std::strcpy(edit.startAngleText, "1e999");
+  std::strcpy(edit.linkSpacingText, "-1e999");
+  edit.linkHeight = INT_MAX;
+  edit.linkCount = INT_MAX;
+  edit.anchorWidth = edit.anchorHeight = 0;
+  edit.platformWidth = edit.platformHeight = INT_MIN;
+  RECT rect = Place(INT_MIN, INT_MIN);
+  const Calls calls = Display(nullptr, edit, rect);
+  ASSERT_EQ(calls.size(), 10u);
+  EXPECT_EQ(calls[2], "DrawText editor \"(-2147483648,-2147483648)\" -1 -2147483648 -2147483648 -2147483648 "
+                      "-2147483648 1 0 0 1 0 0 0 0 0 8");
+  for (const std::string& label : Labels(calls)) EXPECT_LE(label.size(), 25u) << label;
+}
+
+}  // namespace
