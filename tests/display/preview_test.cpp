@@ -77,6 +77,8 @@ TEST_F(PreviewTest, TemplatePictureHasTheRectanglesWhereTheyAreDrawn) {
 
 TEST_F(PreviewTest, BadInputIsNamedAndLeavesTheOutputAlone) {
   std::ofstream(folder_ / "short.bin", std::ios::binary) << std::string(99, '\0');
+  const std::string saved = (folder_ / "saved.bin").string();
+  std::ofstream(saved, std::ios::binary) << std::string(100, '\0');
   const std::string out = (folder_ / "out.png").string();
   std::ofstream(out) << "old";
   const struct {
@@ -90,6 +92,7 @@ TEST_F(PreviewTest, BadInputIsNamedAndLeavesTheOutputAlone) {
       {{"--view-template", "256", out}, "out of range 0 to 255"},
       {{"--starting-angle", "1234567890", out}, "at most 9 characters"},
       {{"--colour", "1", out}, "unknown option --colour"},
+      {{"--settings", saved, saved}, "this is --settings"},
       {{out, "--left"}, "--left needs a value"},
       {{}, "no output file given"},
   };

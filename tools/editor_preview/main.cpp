@@ -8,6 +8,8 @@
 #include "editor_window.h"
 #include "frame/exports.h"
 #include "output_file.h"
+#include "output_paths.h"
+#include "partial_files.h"
 #include "preview_options.h"
 
 namespace {
@@ -49,6 +51,16 @@ int main(int argc, char** argv) {
     std::cout << editor_preview::kUsage;
     return 0;
   }
+  // The picture never replaces the settings file it was made from.
+  if (!options.settingsFile.empty()) {
+    const std::string conflict = tool_output::OutputConflict({{"--settings", options.settingsFile}},
+                                                             {{"output", options.output}});
+    if (!conflict.empty()) {
+      std::cerr << "editor_preview: " << conflict << "\n";
+      return kBadInput;
+    }
+  }
+  tool_output::WatchPartialFiles(1);
 
   // A first display, as the editor makes whenever it draws, gives the
   // object's rectangle and so the size of the picture.
@@ -64,7 +76,7 @@ int main(int argc, char** argv) {
   EditorDisplay(window.host(), nullptr, g_placedObject, &settings, &rect);
 
   try {
-    scene_player::OutputFile output(options.output);
+    tool_output::OutputFile output(options.output);
     if (!window.WritePng(output.stream())) throw std::runtime_error("cannot write " + options.output);
     output.Commit();
   } catch (const std::runtime_error& error) {

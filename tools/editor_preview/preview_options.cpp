@@ -86,7 +86,10 @@ PreviewOptions ReadPreviewOptions(int argc, const char* const* argv) {
   // The file is read first, so that the options given beside it win
   // wherever they stand.
   for (int i = 1; i + 1 < argc; ++i) {
-    if (std::strcmp(argv[i], "--settings") == 0) ReadSettingsFile(argv[i + 1], options.settings);
+    if (std::strcmp(argv[i], "--settings") == 0) {
+      ReadSettingsFile(argv[i + 1], options.settings);
+      options.settingsFile = argv[i + 1];
+    }
   }
 
   EditData& s = options.settings;

@@ -21,6 +21,7 @@ struct PreviewOptions {
   int32_t top = 0;
   int32_t windowWidth = 0;  // 0: fit the object's rectangle and its labels
   int32_t windowHeight = 0;
+  std::string settingsFile;  // empty when no --settings was given
   std::string output;
   bool help = false;
 };

@@ -29,6 +29,7 @@
 namespace {
 
 using namespace scene_player;
+using namespace tool_output;
 
 // Exit statuses: 0 played and written; 1 a failure while playing or
 // writing; 2 bad input (the command line or the scene).

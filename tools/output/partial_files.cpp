@@ -5,7 +5,7 @@
 #include <stdexcept>
 #include <unistd.h>
 
-namespace scene_player {
+namespace tool_output {
 
 namespace {
 
@@ -69,4 +69,4 @@ SignalsHeld::SignalsHeld() {
 
 SignalsHeld::~SignalsHeld() { sigprocmask(SIG_SETMASK, &saved_, nullptr); }
 
-}  // namespace scene_player
+}  // namespace tool_output

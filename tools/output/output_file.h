@@ -11,7 +11,7 @@
 #include <cstdio>
 #include <string>
 
-namespace scene_player {
+namespace tool_output {
 
 class OutputFile {
  public:
@@ -42,4 +42,4 @@ class OutputFile {
   bool closed_ = false;
 };
 
-}  // namespace scene_player
+}  // namespace tool_output

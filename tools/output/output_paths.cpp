@@ -8,7 +8,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-namespace scene_player {
+namespace tool_output {
 
 namespace {
 
@@ -87,4 +87,4 @@ std::string OutputConflict(const std::vector<NamedPath>& inputs, const std::vect
   return "";
 }
 
-}  // namespace scene_player
+}  // namespace tool_output

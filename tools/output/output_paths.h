@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-namespace scene_player {
+namespace tool_output {
 
 // `path` with symbolic links in its last part followed to the file they end
 // at (which need not exist yet). Throws std::runtime_error for a loop.
@@ -21,4 +21,4 @@ struct NamedPath {
 // output; devices such as /dev/null may take several outputs.
 std::string OutputConflict(const std::vector<NamedPath>& inputs, const std::vector<NamedPath>& outputs);
 
-}  // namespace scene_player
+}  // namespace tool_output

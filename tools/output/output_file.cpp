@@ -10,7 +10,7 @@
 #include "output_paths.h"
 #include "partial_files.h"
 
-namespace scene_player {
+namespace tool_output {
 
 namespace {
 
@@ -105,4 +105,4 @@ void OutputFile::Fail(const std::string& what, int error) {
   throw std::runtime_error(what + " " + path_ + ": " + std::strerror(error));
 }
 
-}  // namespace scene_player
+}  // namespace tool_output

@@ -5,7 +5,7 @@
 #include <csignal>
 #include <cstddef>
 
-namespace scene_player {
+namespace tool_output {
 
 // Makes room for `count` files in all and installs the signal handlers.
 // Called once, before the first Add().
@@ -30,4 +30,4 @@ class SignalsHeld {
   sigset_t saved_;
 };
 
-}  // namespace scene_player
+}  // namespace tool_output
