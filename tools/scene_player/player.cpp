@@ -93,14 +93,12 @@ void Player::PlayFrame(int frame) {
   for (; nextEntry_ < scene_.timeline.size() && scene_.timeline[nextEntry_].frame <= frame; ++nextEntry_) {
     RunSteps(scene_.timeline[nextEntry_].steps);
   }
-  // The host frees the objects destroyed so far once this frame's handle
-  // call has run; those destroyed by rules during it wait for the next frame.
-  std::vector<std::size_t> freed;
-  for (std::size_t i = 0; i < objects_.size(); ++i) {
-    if (objects_[i].state == State::Destroyed) freed.push_back(i);
-  }
+  // The host frees every object destroyed in this frame, by the timeline or
+  // by rules during it, once this frame's handle call has run.
   host_.RunFrame();
-  for (std::size_t i : freed) objects_[i] = ObjectState{State::Gone};
+  for (ObjectState& target : objects_) {
+    if (target.state == State::Destroyed) target = ObjectState{State::Gone};
+  }
   if (eventFailure_) std::rethrow_exception(std::exchange(eventFailure_, nullptr));
 }
 

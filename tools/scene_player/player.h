@@ -30,7 +30,7 @@ class Player {
   // frame (not yet created, or destroyed).
   const HostObject* live(std::size_t index) const;
   // The scene object that `object` is, or -1. Also finds objects destroyed in
-  // this frame, which the library may still refer to until the next one.
+  // this frame, which stay readable until its handle call has run.
   int IndexOf(const HostObject* object) const;
 
  private:
