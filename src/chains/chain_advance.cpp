@@ -36,7 +36,7 @@ void AdvanceChain(RunData& rd, uint32_t chain, bool turn) {
   // No event is raised here, so the record and the objects stay where they
   // are for the whole call.
   ChainRecord& r = rd.chains->At(chain);
-  const HostObjectHeader& anchor = r.anchor->head;
+  const HostObject* const anchor = r.anchor;
 
   const double speed = static_cast<double>(r.speed) + r.acceleration;
   r.speed = RoundToFloat(speed);
@@ -62,22 +62,35 @@ void AdvanceChain(RunData& rd, uint32_t chain, bool turn) {
   const double theta = (static_cast<double>(r.angle) + kPlacementOffset) * kDegree;
   const double cosTheta = std::cos(theta);
   const double sinTheta = std::sin(theta);
-  r.platformX = RoundToFloat(cosTheta * length + anchor.x);
-  r.platformY = RoundToFloat(sinTheta * length + anchor.y);
+  r.platformX = RoundToFloat(cosTheta * length + anchor->head.x);
+  r.platformY = RoundToFloat(sinTheta * length + anchor->head.y);
 
   // Each link stands at its own height (plus spacing) times its place, so
-  // links of differing heights need not end where the platform hangs.
-  const uint32_t first = n * chain;  // link k of the chain is element first + k - 1
+  // links of differing heights need not end where the platform hangs. What
+  // is the chain's is read once; the anchor's position is read again only
+  // after placing a link that is the anchor itself, which moves it for the
+  // links after it.
+  const double spacing = r.linkSpacing;
+  double anchorX = anchor->head.x;
+  double anchorY = anchor->head.y;
+  // A direction from an angle that is not finite leaves every object's own.
+  const bool turns = turn && std::isfinite(r.angle);
+  const int32_t direction = turns ? ChainDirection(r.angle, 0) : 0;
+  HostObject* const* links = n > 0 ? &rd.links->At(n * chain) : nullptr;  // link k is links[k - 1]
   for (uint32_t k = 1; k <= n; ++k) {
-    HostObject& link = *rd.links->At(first + k - 1);
-    const double step = static_cast<double>(link.head.height) + r.linkSpacing;
-    const double distance = step * static_cast<double>(static_cast<float>(k));
-    PlaceObject(link, cosTheta * distance + anchor.x, sinTheta * distance + anchor.y);
-    if (turn) link.direction = ChainDirection(r.angle, link.direction);
+    HostObject& link = *links[k - 1];
+    const double place = static_cast<float>(k);
+    const double distance = (static_cast<double>(link.head.height) + spacing) * place;
+    PlaceObject(link, cosTheta * distance + anchorX, sinTheta * distance + anchorY);
+    if (turns) link.direction = direction;
+    if (&link == anchor) {
+      anchorX = link.head.x;
+      anchorY = link.head.y;
+    }
   }
 
   if (HostObject* platform = PlatformOfChain(rd, chain)) {
     PlaceObject(*platform, r.platformX, r.platformY);
-    if (turn) platform->direction = ChainDirection(r.angle, platform->direction);
+    if (turns) platform->direction = direction;
   }
 }

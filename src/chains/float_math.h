@@ -21,8 +21,8 @@ inline float RoundToFloat(double value) {
 // saturates at its end of the range; NaN, which has no integer, yields
 // `ifNaN` (callers pass the coordinate the object already has, so it stays).
 inline int32_t TruncateToInt(double value, int32_t ifNaN) {
+  // One test for the common case: NaN fails both comparisons.
+  if (value > -2147483649.0 && value < 2147483648.0) return static_cast<int32_t>(value);
   if (std::isnan(value)) return ifNaN;
-  if (value >= 2147483648.0) return std::numeric_limits<int32_t>::max();
-  if (value <= -2147483649.0) return std::numeric_limits<int32_t>::min();
-  return static_cast<int32_t>(value);
+  return value > 0.0 ? std::numeric_limits<int32_t>::max() : std::numeric_limits<int32_t>::min();
 }
