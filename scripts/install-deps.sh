@@ -9,6 +9,7 @@ packages=(
   g++-mingw-w64-i686 g++-mingw-w64-x86-64 binutils-mingw-w64-i686 binutils-mingw-w64-x86-64
   wine wine64
   libgif-dev libpng-dev nlohmann-json3-dev
+  libbox2d-dev
 )
 missing=()
 for p in "${packages[@]}"; do

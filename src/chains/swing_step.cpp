@@ -7,9 +7,9 @@ namespace {
 
 constexpr int32_t kOnSwingCode = 1;
 
-bool Destroyed(const HostObject* object) { return IsBeingDestroyed(*object); }
-
-bool AnchorDestroyed(const ChainRecord& chain) { return IsBeingDestroyed(*chain.anchor); }
+// Lambdas rather than functions, so that the walks inline the test.
+constexpr auto Destroyed = [](const HostObject* object) { return IsBeingDestroyed(*object); };
+constexpr auto AnchorDestroyed = [](const ChainRecord& chain) { return IsBeingDestroyed(*chain.anchor); };
 
 }  // namespace
 
