@@ -1,4 +1,4 @@
-#!/usr/bin/env python3
+#!/usr/bin/python3
 """Instructions per frame of the swing step, the limit loop and the Box2D
 chain, counted by callgrind for every chain size of the benchmark binary, and
 their ratios as a Markdown table. Instruction counts do not depend on what
@@ -24,7 +24,7 @@ CALLS = re.compile(r"\((\d[\d,]*)x\)")
 
 def per_call(profile):
     """Inclusive instructions per call of each measured function."""
-    text = subprocess.run(["callgrind_annotate", "--inclusive=yes", "--tree=caller", profile],
+    text = subprocess.run(["callgrind_annotate", "--inclusive=yes", "--tree=caller", "--threshold=100", profile],
                           check=True, capture_output=True, text=True).stdout
     lines = text.split("\n")
     result = {}
@@ -51,7 +51,7 @@ def main():
             profile = str(Path(scratch) / f"{chains}x{links}.out")
             pattern = f"^(SwingStep|SwingLimit|Box2DChain)/chains:{chains}/links:{links}$"
             subprocess.run(["valgrind", "--tool=callgrind", f"--callgrind-out-file={profile}", binary,
-                            f"--benchmark_filter={pattern}", "--benchmark_min_time=0.01"],
+                            f"--benchmark_filter={pattern}", "--benchmark_min_time=0.1"],
                            check=True, capture_output=True)
             ir = per_call(profile)
             print(f"| {chains} x {links} | {ir['step']:,.0f} | {ir['limit']:,.0f} | {ir['box2d']:,.0f} | "
