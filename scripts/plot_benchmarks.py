@@ -19,19 +19,19 @@ matplotlib.use("Agg")
 import matplotlib.pyplot as plt  # noqa: E402
 
 FAMILIES = {"SwingStep": "swing step", "SwingLimit": "limit loop", "Box2DChain": "Box2D"}
-NAME = re.compile(r"^(\w+)/(\w+):(\d+)/(\w+):(\d+)$")
+ARGUMENT = re.compile(r"/\w+:(\d+)")
 
 
 def results(path):
-    """{(family, a, b): entry}: the median of each benchmark, or its only run."""
+    """{(family, arguments...): entry}: the median of each benchmark, or its only run."""
     with open(path) as file:
         data = json.load(file)
     found = {}
     for entry in data["benchmarks"]:
         if entry.get("run_type") == "aggregate" and entry.get("aggregate_name") != "median":
             continue
-        name = NAME.match(entry["run_name"])
-        key = (name.group(1), int(name.group(3)), int(name.group(5)))
+        name = entry["run_name"]
+        key = (name.split("/")[0], *(int(value) for value in ARGUMENT.findall(name)))
         if entry.get("aggregate_name") == "median" or key not in found:
             found[key] = entry
     return data["context"], found
@@ -43,7 +43,7 @@ def microseconds(entry):
 
 
 def table(found):
-    sizes = sorted({(a, b) for family, a, b in found if family == "SwingStep"}, key=lambda s: (s[0] * s[1], s))
+    sizes = sorted({key[1:] for key in found if key[0] == "SwingStep"}, key=lambda s: (s[0] * s[1], s))
     print("| C x M | step µs | limit µs | Box2D µs | step ns/link | step/limit | Box2D/step |")
     print("|---|---:|---:|---:|---:|---:|---:|")
     for chains, links in sizes:
@@ -52,22 +52,22 @@ def table(found):
               f"{microseconds(box2d):.1f} | {step['ns_per_link'] * 1e9:.2f} | "
               f"{microseconds(step) / microseconds(limit):.2f} | {microseconds(box2d) / microseconds(step):.0f} |")
     print()
-    print("| lookup | objects | found | ns |")
+    print("| lookup | objects | object | ns |")
     print("|---|---:|---|---:|")
-    for (family, objects, hit), entry in sorted(found.items()):
-        if family.endswith("Lookup"):
-            print(f"| {family} | {objects} | {'near the end' if hit else 'nowhere'} | "
-                  f"{microseconds(entry) * 1e3:.1f} |")
+    for key, entry in sorted(found.items()):
+        if "Index" in key[0]:
+            which = "found nowhere" if key[2:] == (0,) else "near the end" if key[2:] == (1,) else "after a removal"
+            print(f"| {key[0]} | {key[1]} | {which} | {microseconds(entry) * 1e3:,.1f} |")
 
 
 def plot(context, found, output):
-    figure, axes = plt.subplots(figsize=(8, 5))
+    figure, axes = plt.subplots(figsize=(8, 6))
     styles = {1: "-", 10: "--", 100: ":"}
     colours = {"SwingStep": "tab:blue", "SwingLimit": "tab:green", "Box2DChain": "tab:red"}
     for family, label in FAMILIES.items():
         for chains, style in styles.items():
-            points = sorted((links, entry["ns_per_link"] * 1e9)
-                            for (name, c, links), entry in found.items() if name == family and c == chains)
+            points = sorted((key[2], entry["ns_per_link"] * 1e9)
+                            for key, entry in found.items() if key[0] == family and key[1] == chains)
             if points:
                 axes.plot(*zip(*points), style, marker="o", color=colours[family], label=f"{label}, {chains} chain(s)")
     axes.set_xscale("log")
@@ -76,7 +76,7 @@ def plot(context, found, output):
     axes.set_ylabel("CPU ns per link and frame")
     axes.set_title(f"One frame of C chains of M links ({context['num_cpus']} cores, {context['mhz_per_cpu']} MHz)")
     axes.grid(True, which="both", alpha=0.3)
-    axes.legend(fontsize="small", ncol=3)
+    axes.legend(fontsize="small", ncol=3, loc="upper center", bbox_to_anchor=(0.5, -0.12))
     figure.tight_layout()
     figure.savefig(output, dpi=100)
 
