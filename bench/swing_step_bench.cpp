@@ -1,42 +1,31 @@
-// Cost of one frame: C chains of M links each, stepped through the stand-in
-// host with an event handler that does nothing.
+// One frame of C chains of M links: the library's swing step through the
+// stand-in host (an "On Swing" handler that does nothing), and the limit
+// loop doing the same arithmetic and writes on the same host objects.
 #include <benchmark/benchmark.h>
 
-#include "chains/run_data.h"
-#include "frame/edit_data.h"
-#include "host.h"
+#include "bench_scene.h"
+#include "swing_limit.h"
 
 namespace {
 
-void SwingFrame(benchmark::State& state) {
-  const auto chains = static_cast<int>(state.range(0));
-  const auto linksPerChain = static_cast<int>(state.range(1));
-  EditData edit{};
-  WriteEditDataDefaults(edit);
-  standin::Host host(edit);
-  host.onEvent = [](int32_t, int32_t) {};
-  RunData& rd = host.extension();
-  for (int c = 0; c < chains; ++c) {
-    AddChain(rd, host.AddObject(100 * c, 0, 32));
-    rd.chains->At(static_cast<uint32_t>(c)).swinging = 1;
-    rd.platforms->Append(host.AddObject(0, 0, 16));
-  }
-  for (int l = 0; l < chains * linksPerChain; ++l) rd.links->Append(host.AddObject(0, 0, 8));
-
-  for (auto _ : state) host.RunFrame();
-
-  const double links = static_cast<double>(chains) * linksPerChain;
-  state.counters["ns_per_chain"] =
-      benchmark::Counter(chains, benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
-  state.counters["ns_per_link"] =
-      benchmark::Counter(links, benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
+void SwingStep(benchmark::State& state) {
+  BenchScene scene(static_cast<int>(state.range(0)), static_cast<int>(state.range(1)));
+  scene.host.onEvent = [](int32_t, int32_t) {};
+  for (auto _ : state) scene.host.RunFrame();
+  CountChainsAndLinks(state);
 }
 
-BENCHMARK(SwingFrame)
-    ->ArgNames({"chains", "links"})
-    ->ArgsProduct({{1, 10}, {1, 10, 100, 1000}})
-    ->Unit(benchmark::kMicrosecond);
+void SwingLimit(benchmark::State& state) {
+  BenchScene scene(static_cast<int>(state.range(0)), static_cast<int>(state.range(1)));
+  LimitChains limit = LimitChainsOf(scene.rd);
+  for (auto _ : state) {
+    LimitFrame(limit);
+    benchmark::ClobberMemory();
+  }
+  CountChainsAndLinks(state);
+}
+
+BENCHMARK(SwingStep)->Apply(ChainSizes);
+BENCHMARK(SwingLimit)->Apply(ChainSizes);
 
 }  // namespace
-
-BENCHMARK_MAIN();

@@ -87,14 +87,20 @@ class Run {
     for (uint32_t i = 0; i < ChainCount(rd); ++i) Check(live(rd.chains->At(i).anchor));
   }
 
+  // The host frees the objects destroyed so far once the frame has run.
   void RunFrame() {
     host_.RunFrame();
+    dying_.clear();
     if (host_.created()) CheckListsHoldLiveObjects();
   }
 
+  // A live object, or one destroyed in this frame: the host may still hand
+  // that to an action until the frame's handle call has run.
   intptr_t ObjectArgument() {
-    if (objects_.empty()) return 0;
-    return reinterpret_cast<intptr_t>(objects_[program_.Byte() % objects_.size()]);
+    const size_t count = objects_.size() + dying_.size();
+    if (count == 0) return 0;
+    const size_t which = program_.Byte() % count;
+    return reinterpret_cast<intptr_t>(which < objects_.size() ? objects_[which] : dying_[which - objects_.size()]);
   }
 
   void Step(bool mayRunFrame) {
@@ -134,11 +140,10 @@ class Run {
         if (mayRunFrame) RunFrame();
         break;
       case 5:
-        // A destroyed object must not be handed to the library again: the
-        // host frees it after the next frame.
         if (!objects_.empty()) {
           const size_t which = program_.Byte() % objects_.size();
           host_.Destroy(objects_[which]);
+          dying_.push_back(objects_[which]);
           objects_.erase(objects_.begin() + static_cast<std::ptrdiff_t>(which));
         }
         break;
@@ -153,6 +158,7 @@ class Run {
   // An object of the frame that no action is ever given.
   HostObject* bystander_ = host_.AddObject(7, 7, 7, {7, 7});
   std::vector<HostObject*> objects_;
+  std::vector<HostObject*> dying_;  // destroyed in this frame, freed after it
   int depth_ = 0;
 };
 

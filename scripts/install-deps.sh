@@ -11,6 +11,7 @@ packages=(
   wine wine64 xvfb xauth
   libgif-dev libpng-dev nlohmann-json3-dev libcairo2-dev fonts-dejavu-core
   python3
+  libbox2d-dev
 )
 missing=()
 for p in "${packages[@]}"; do

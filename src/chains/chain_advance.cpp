@@ -1,6 +1,7 @@
 // The pendulum arithmetic shared by the swing step and the chain update.
 // Every intermediate is a double, record fields are rounded to float when
 // stored, and every integer comes from truncation toward zero.
+#include <algorithm>
 #include <cmath>
 
 #include "chains/float_math.h"
@@ -13,11 +14,17 @@ namespace {
 // little short of pi / 180, so angle 0 does not hang exactly below the anchor.
 constexpr double kDegree = 0.017453277777777776;
 constexpr double kPlacementOffset = 90.0;       // angle 0 hangs straight down
+constexpr uint32_t kExactFloatIntegers = 1u << 24;  // every integer up to here is a float
 constexpr double kDirectionStep = 0.08888888888888889;  // 32 directions per 360 degrees
 
 void PlaceObject(HostObject& object, double x, double y) {
-  object.head.x = TruncateToInt(x, object.head.x);
-  object.head.y = TruncateToInt(y, object.head.y);
+  if (int32_t ix, iy; TruncatesToInt(x, ix) && TruncatesToInt(y, iy)) [[likely]] {
+    object.head.x = ix;
+    object.head.y = iy;
+  } else {
+    object.head.x = TruncateToInt(x, object.head.x);
+    object.head.y = TruncateToInt(y, object.head.y);
+  }
   object.changed = 1;
 }
 
@@ -36,7 +43,7 @@ void AdvanceChain(RunData& rd, uint32_t chain, bool turn) {
   // No event is raised here, so the record and the objects stay where they
   // are for the whole call.
   ChainRecord& r = rd.chains->At(chain);
-  const HostObjectHeader& anchor = r.anchor->head;
+  const HostObject* const anchor = r.anchor;
 
   const double speed = static_cast<double>(r.speed) + r.acceleration;
   r.speed = RoundToFloat(speed);
@@ -62,22 +69,41 @@ void AdvanceChain(RunData& rd, uint32_t chain, bool turn) {
   const double theta = (static_cast<double>(r.angle) + kPlacementOffset) * kDegree;
   const double cosTheta = std::cos(theta);
   const double sinTheta = std::sin(theta);
-  r.platformX = RoundToFloat(cosTheta * length + anchor.x);
-  r.platformY = RoundToFloat(sinTheta * length + anchor.y);
+  r.platformX = RoundToFloat(cosTheta * length + anchor->head.x);
+  r.platformY = RoundToFloat(sinTheta * length + anchor->head.y);
 
   // Each link stands at its own height (plus spacing) times its place, so
-  // links of differing heights need not end where the platform hangs.
-  const uint32_t first = n * chain;  // link k of the chain is element first + k - 1
-  for (uint32_t k = 1; k <= n; ++k) {
-    HostObject& link = *rd.links->At(first + k - 1);
-    const double step = static_cast<double>(link.head.height) + r.linkSpacing;
-    const double distance = step * static_cast<double>(static_cast<float>(k));
-    PlaceObject(link, cosTheta * distance + anchor.x, sinTheta * distance + anchor.y);
-    if (turn) link.direction = ChainDirection(r.angle, link.direction);
-  }
+  // links of differing heights need not end where the platform hangs. What
+  // is the chain's is read once; the anchor's position is read again only
+  // after placing a link that is the anchor itself, which moves it for the
+  // links after it.
+  const double spacing = r.linkSpacing;
+  double anchorX = anchor->head.x;
+  double anchorY = anchor->head.y;
+  HostObject* const* const links = n > 0 ? &rd.links->At(n * chain) : nullptr;  // link k is links[k - 1]
+  const auto placeLink = [&](uint32_t k, double place) {
+    HostObject& link = *links[k - 1];
+    const double distance = (static_cast<double>(link.head.height) + spacing) * place;
+    PlaceObject(link, cosTheta * distance + anchorX, sinTheta * distance + anchorY);
+    if (&link == anchor) {
+      anchorX = link.head.x;
+      anchorY = link.head.y;
+    }
+  };
+  // A link's place is k as a float. Up to 2^24 that is k exactly, which a
+  // running sum gives more cheaply than a conversion for every link.
+  const uint32_t exactPlaces = std::min(n, kExactFloatIntegers);
+  double place = 0.0;
+  for (uint32_t k = 1; k <= exactPlaces; ++k) placeLink(k, place += 1.0);
+  for (uint32_t k = exactPlaces + 1; k <= n; ++k) placeLink(k, static_cast<float>(k));
+
+  // A direction from an angle that is not finite leaves every object's own.
+  const bool turns = turn && std::isfinite(r.angle);
+  const int32_t direction = turns ? ChainDirection(r.angle, 0) : 0;
+  for (uint32_t k = 1; turns && k <= n; ++k) links[k - 1]->direction = direction;
 
   if (HostObject* platform = PlatformOfChain(rd, chain)) {
     PlaceObject(*platform, r.platformX, r.platformY);
-    if (turn) platform->direction = ChainDirection(r.angle, platform->direction);
+    if (turns) platform->direction = direction;
   }
 }

@@ -3,6 +3,8 @@
 // out of the target's range is undefined behaviour, so none is done directly.
 #pragma once
 
+#include <emmintrin.h>  // every target is x86 with SSE2
+
 #include <cmath>
 #include <cstdint>
 #include <limits>
@@ -12,17 +14,27 @@
 inline float RoundToFloat(double value) {
   // Half an ulp above FLT_MAX: from here on, rounding to nearest gives infinity.
   constexpr double kFloatOverflow = 0x1.ffffffp127;
+  if (std::fabs(value) < kFloatOverflow) [[likely]] return static_cast<float>(value);
   if (value >= kFloatOverflow) return std::numeric_limits<float>::infinity();
   if (value <= -kFloatOverflow) return -std::numeric_limits<float>::infinity();
   return static_cast<float>(value);  // NaN converts to NaN
 }
 
+// Truncates `value` toward zero into `result` with the processor's own
+// conversion, which turns every double that has no int32 (NaN, beyond the
+// range) into INT32_MIN. True when the result is anything else, which is
+// then exact; on false, TruncateToInt gives the right answer.
+inline bool TruncatesToInt(double value, int32_t& result) {
+  result = _mm_cvttsd_si32(_mm_set_sd(value));
+  return result != std::numeric_limits<int32_t>::min();
+}
+
 // Truncates toward zero to a 32-bit integer. A value beyond the int32 range
-// saturates at its end of the range; NaN, which has no integer, yields
+// saturates at its end of the range (from -2^31 down, truncation gives
+// INT32_MIN exactly or would go below it); NaN, which has no integer, yields
 // `ifNaN` (callers pass the coordinate the object already has, so it stays).
 inline int32_t TruncateToInt(double value, int32_t ifNaN) {
+  if (int32_t result; TruncatesToInt(value, result)) [[likely]] return result;
   if (std::isnan(value)) return ifNaN;
-  if (value >= 2147483648.0) return std::numeric_limits<int32_t>::max();
-  if (value <= -2147483649.0) return std::numeric_limits<int32_t>::min();
-  return static_cast<int32_t>(value);
+  return value > 0.0 ? std::numeric_limits<int32_t>::max() : std::numeric_limits<int32_t>::min();
 }

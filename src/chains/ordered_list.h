@@ -2,6 +2,7 @@
 // the order of the rest. Nothing here checks an index; callers check their own.
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 #include <vector>
 
@@ -28,11 +29,32 @@ class OrderedList {
   }
 
   // Removes one element; later elements move down one index. Storage is kept.
-  void RemoveAt(uint32_t index) { items_.erase(items_.begin() + index); }
+  void RemoveAt(uint32_t index) {
+    items_.erase(items_.begin() + index);
+    ++removals_;
+  }
+
+  // Removes every element for which `doomed` is true, keeping the order of
+  // the rest, in one walk. Storage is kept.
+  template <typename Predicate>
+  void RemoveIf(Predicate doomed) {
+    const auto end = std::remove_if(items_.begin(), items_.end(), doomed);
+    if (end == items_.end()) return;
+    items_.erase(end, items_.end());
+    ++removals_;
+  }
 
   // Frees the storage and leaves the list empty.
-  void Release() { std::vector<T>().swap(items_); }
+  void Release() {
+    std::vector<T>().swap(items_);
+    ++removals_;
+  }
+
+  // How many times elements have left the list. While it stays the same,
+  // every element keeps its position, so an index of positions stays valid.
+  uint64_t Removals() const { return removals_; }
 
  private:
   std::vector<T> items_;
+  uint64_t removals_ = 0;
 };

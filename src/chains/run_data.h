@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdint>
 
+#include "chains/identifier_index.h"
 #include "chains/ordered_list.h"
 #include "frame/host_object.h"
 
@@ -24,8 +25,27 @@ struct ChainRecord {
   uint8_t swinging;    // 1 while the swing step moves the chain every frame
 };
 
-class ObjectList : public OrderedList<HostObject*> {};
-class ChainList : public OrderedList<ChainRecord> {};
+class ObjectList : public OrderedList<HostObject*> {
+ public:
+  // The position of the first object whose identifier is `id`.
+  std::optional<uint32_t> Find(int32_t id) {
+    return index_.Find(id, Count(), Removals(), [this](uint32_t i) { return ObjectIdentifier(At(i)->head); });
+  }
+
+ private:
+  IdentifierIndex index_;
+};
+
+class ChainList : public OrderedList<ChainRecord> {
+ public:
+  // The index of the first chain whose anchor's identifier is `id`.
+  std::optional<uint32_t> FindAnchor(int32_t id) {
+    return index_.Find(id, Count(), Removals(), [this](uint32_t i) { return ObjectIdentifier(At(i).anchor->head); });
+  }
+
+ private:
+  IdentifierIndex index_;
+};
 
 struct RunData {
   HostObjectHeader head;  // the extension's own host object

@@ -7,16 +7,9 @@ namespace {
 
 constexpr int32_t kOnSwingCode = 1;
 
-void RemoveDestroyed(ObjectList* list) {
-  if (list == nullptr) return;
-  for (uint32_t j = 0; j < list->Count();) {
-    if (IsBeingDestroyed(*list->At(j))) {
-      list->RemoveAt(j);  // the next element moved into j: examine it next
-    } else {
-      ++j;
-    }
-  }
-}
+// Lambdas rather than functions, so that the walks inline the test.
+constexpr auto Destroyed = [](const HostObject* object) { return IsBeingDestroyed(*object); };
+constexpr auto AnchorDestroyed = [](const ChainRecord& chain) { return IsBeingDestroyed(*chain.anchor); };
 
 }  // namespace
 
@@ -26,7 +19,7 @@ void SwingStep(RunData& rd) {
   // the event: the count and every record are looked up afresh each round.
   for (uint32_t i = 0; i < ChainCount(rd);) {
     const ChainRecord& chain = rd.chains->At(i);
-    if (IsBeingDestroyed(*chain.anchor)) {
+    if (AnchorDestroyed(chain)) {
       rd.chains->RemoveAt(i);  // the record that moved into i is tested next
       continue;
     }
@@ -37,6 +30,11 @@ void SwingStep(RunData& rd) {
     }
     ++i;
   }
-  RemoveDestroyed(rd.platforms);
-  RemoveDestroyed(rd.links);
+  if (rd.platforms != nullptr) rd.platforms->RemoveIf(Destroyed);
+  if (rd.links != nullptr) rd.links->RemoveIf(Destroyed);
+  // An "On Swing" rule may have destroyed the anchor of a chain that the pass
+  // had already stepped. The host frees every object flagged in this frame
+  // as soon as this call returns, so that chain cannot wait for the next
+  // pass: it leaves now, having kept this frame's step and event.
+  if (rd.chains != nullptr) rd.chains->RemoveIf(AnchorDestroyed);
 }

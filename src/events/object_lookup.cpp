@@ -1,6 +1,7 @@
 // The expressions that find the chain, and the place in it, of a host object
 // given by its identifier. Nothing but positions in the lists ties an object
-// to a chain, so both search the lists in order and take the first match.
+// to a chain, so both take the first match in list order, which each list
+// keeps an index of.
 #include <optional>
 
 #include "chains/run_data.h"
@@ -11,21 +12,8 @@ namespace {
 
 constexpr int32_t kNotFound = -1;
 
-// The position of the first object in `list` whose identifier is `id`.
-std::optional<uint32_t> FindObject(const ObjectList* list, int32_t id) {
-  if (list == nullptr) return std::nullopt;
-  for (uint32_t i = 0; i < list->Count(); ++i) {
-    if (ObjectIdentifier(list->At(i)->head) == id) return i;
-  }
-  return std::nullopt;
-}
-
-std::optional<uint32_t> FindAnchor(const ChainList* chains, int32_t id) {
-  if (chains == nullptr) return std::nullopt;
-  for (uint32_t i = 0; i < chains->Count(); ++i) {
-    if (ObjectIdentifier(chains->At(i).anchor->head) == id) return i;
-  }
-  return std::nullopt;
+std::optional<uint32_t> FindObject(ObjectList* list, int32_t id) {
+  return list != nullptr ? list->Find(id) : std::nullopt;
 }
 
 }  // namespace
@@ -42,7 +30,9 @@ int32_t TVCALL ChainIndex(RunData* rd, intptr_t token) {
   if (const uint32_t perChain = LinksPerChain(*rd); perChain > 0) {
     if (const auto link = FindObject(rd->links, id)) return static_cast<int32_t>(*link / perChain);
   }
-  if (const auto anchor = FindAnchor(rd->chains, id)) return static_cast<int32_t>(*anchor);
+  if (rd->chains != nullptr) {
+    if (const auto anchor = rd->chains->FindAnchor(id)) return static_cast<int32_t>(*anchor);
+  }
   return kNotFound;
 }
 

@@ -66,19 +66,16 @@ void Host::Destroy(HostObject* object) {
 }
 
 void Host::RunFrame() {
-  // Objects destroyed during this frame's own events wait for the next one.
-  const std::size_t pending = destroyed_.size();
   if (created_) HandleRunObject(extension_);
-  FreeDestroyed(pending);
+  FreeDestroyed();
 }
 
-void Host::FreeDestroyed(std::size_t count) {
-  for (std::size_t i = 0; i < count; ++i) {
-    HostObject* object = destroyed_[i];
+void Host::FreeDestroyed() {
+  for (HostObject* object : destroyed_) {
     objects_.erase(std::find(objects_.begin(), objects_.end(), object));
     std::free(object);
   }
-  destroyed_.erase(destroyed_.begin(), destroyed_.begin() + static_cast<std::ptrdiff_t>(count));
+  destroyed_.clear();
 }
 
 int16_t Host::Action(int code, intptr_t param1, intptr_t param2, float floatValue) {

@@ -39,10 +39,12 @@ class Host {
   // A new object of the frame, zero-filled but for what is given.
   HostObject* AddObject(int32_t x, int32_t y, int32_t height, ObjectId id = {});
   // Marks the object as being destroyed. It stays readable and writable
-  // until the next frame's HandleRunObject has run, and is then freed.
+  // until HandleRunObject has returned in this frame (the next RunFrame, or
+  // the running one when destroyed during its events), and not a moment
+  // longer: it is then freed, as the host frees it.
   void Destroy(HostObject* object);
 
-  // One frame: HandleRunObject, then the objects destroyed before it are freed.
+  // One frame: HandleRunObject, then every object destroyed so far is freed.
   void RunFrame();
 
   // Runs an action through the action table. `floatValue` is what the
@@ -73,7 +75,7 @@ class Host {
   static int32_t TVCALL GetNextParameter(HostObjectHeader* own, int32_t zero, intptr_t token);
   static int32_t TVCALL GetFloatParameter(HostObjectHeader* own, int32_t one, int32_t zero);
   static Host& From(HostObjectHeader* own);
-  void FreeDestroyed(std::size_t count);
+  void FreeDestroyed();
 
   struct Context {
     HostRunContext services;  // first: the extension sees only the slots

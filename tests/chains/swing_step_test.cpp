@@ -1,3 +1,4 @@
+#include <utility>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -162,6 +163,71 @@ TEST(SwingStep, ChainAppendedDuringOnSwingIsSteppedLaterInTheSamePass) {
   EXPECT_EQ(scene.raisedFor, (std::vector<int32_t>{0, 1}));
   EXPECT_EQ(scene.Chain(1).angle, 90.0f);
   EXPECT_NE(scene.Chain(1).platformX, 0.0f);
+}
+
+// In the first frame an "On Swing" rule of chain 1 destroys objects, and may
+// hand one to the chains again at once. The host frees them as soon as that
+// frame's handle call has returned, so no list may hold one after it: the
+// second frame would read freed memory (AddressSanitizer). A chain whose
+// anchor went keeps its step and event only if the pass had reached it.
+TEST(SwingStep, ObjectsDestroyedDuringOnSwingLeaveTheListsInTheSameFrame) {
+  enum Object { A0, A1, A2, L0, L1, L2, P0, P1, P2, None };
+  const struct {
+    const char* what;
+    Object destroyed, readded;
+    std::vector<int32_t> events;
+    std::vector<Object> anchors, links, platforms;
+  } cases[] = {
+      {"earlier chain's anchor", A0, None, {0, 1, 2}, {A1, A2}, {L0, L1, L2}, {P0, P1, P2}},
+      {"later chain's anchor", A2, None, {0, 1}, {A0, A1}, {L0, L1, L2}, {P0, P1, P2}},
+      {"own chain's anchor", A1, None, {0, 1, 2}, {A0, A2}, {L0, L1, L2}, {P0, P1, P2}},
+      {"a link", L2, None, {0, 1, 2}, {A0, A1, A2}, {L0, L1}, {P0, P1, P2}},
+      {"a platform", P0, None, {0, 1, 2}, {A0, A1, A2}, {L0, L1, L2}, {P1, P2}},
+      {"own anchor, anchoring a new chain", A1, A1, {0, 1, 2}, {A0, A2}, {L0, L1, L2}, {P0, P1, P2}},
+      {"a link, added again", L1, L1, {0, 1, 2}, {A0, A1, A2}, {L0, L2}, {P0, P1, P2}},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.what);
+    ChainScene scene;
+    HostObject* objects[None];
+    for (int i = 0; i < 3; ++i) objects[A0 + i] = scene.Anchor(100 * i, 0, 1);
+    for (int i = 0; i < 3; ++i) objects[L0 + i] = scene.Link(10);
+    for (int i = 0; i < 3; ++i) objects[P0 + i] = scene.Platform();
+    std::vector<int32_t> events;
+    bool ruleRan = false;
+    scene.host.onEvent = [&](int32_t, int32_t) {
+      events.push_back(scene.rd.currentChain);
+      if (scene.rd.currentChain != 1 || std::exchange(ruleRan, true)) return;
+      HostObject* doomed = objects[c.destroyed];
+      scene.host.Destroy(doomed);
+      if (c.readded == None) return;
+      if (c.readded <= A2) {
+        AddChain(scene.rd, doomed);
+        scene.Chain(scene.rd.chains->Count() - 1).swinging = 1;
+      } else {
+        scene.rd.links->Append(doomed);
+      }
+    };
+    scene.host.RunFrame();
+    EXPECT_EQ(events, c.events);
+    const auto names = [&](auto count, auto at) {
+      std::vector<HostObject*> list;
+      for (uint32_t i = 0; i < count; ++i) list.push_back(at(i));
+      return list;
+    };
+    const auto expected = [&](const std::vector<Object>& which) {
+      std::vector<HostObject*> list;
+      for (Object o : which) list.push_back(objects[o]);
+      return list;
+    };
+    EXPECT_EQ(names(scene.rd.chains->Count(), [&](uint32_t i) { return scene.Chain(i).anchor; }), expected(c.anchors));
+    EXPECT_EQ(names(scene.rd.links->Count(), [&](uint32_t i) { return scene.rd.links->At(i); }), expected(c.links));
+    EXPECT_EQ(names(scene.rd.platforms->Count(), [&](uint32_t i) { return scene.rd.platforms->At(i); }),
+              expected(c.platforms));
+    events.clear();
+    scene.host.RunFrame();
+    EXPECT_EQ(events.size(), c.anchors.size());
+  }
 }
 
 }  // namespace

@@ -230,4 +230,65 @@ TEST_F(ObjectLookupTest, LinkIsInNoChainWhileThereAreFewerLinksThanChains) {
   EXPECT_EQ(LinkIndexOf(101), -1);
 }
 
+// The lists keep an index for these two lookups. Whatever changes the lists
+// (appends from inside "On Swing", objects destroyed and pruned, in the pass
+// or after it, an identifier in several lists or several times in one), the
+// answers must stay those of walking the lists from the start.
+TEST_F(ObjectLookupTest, AnswersAreThoseOfWalkingTheListsWhateverChangesThem) {
+  RunData& rd = host.extension();
+  const auto walk = [](ObjectList* list, int32_t id) -> int32_t {
+    for (uint32_t i = 0; i < list->Count(); ++i) {
+      if (ObjectIdentifier(list->At(i)->head) == id) return static_cast<int32_t>(i);
+    }
+    return -1;
+  };
+  const auto check = [&] {
+    const uint32_t perChain = LinksPerChain(rd);
+    for (int32_t id = 0; id < 8; ++id) {
+      int32_t chain = walk(rd.platforms, id);
+      const int32_t link = walk(rd.links, id);
+      if (chain < 0 && link >= 0 && perChain > 0) chain = link / static_cast<int32_t>(perChain);
+      for (uint32_t i = 0; chain < 0 && i < rd.chains->Count(); ++i) {
+        if (ObjectIdentifier(rd.chains->At(i).anchor->head) == id) chain = static_cast<int32_t>(i);
+      }
+      ASSERT_EQ(ChainIndexOf(id), chain) << "identifier " << id;
+      ASSERT_EQ(LinkIndexOf(id), link >= 0 && perChain > 0 ? link % static_cast<int32_t>(perChain) : -1);
+    }
+  };
+  uint32_t seed = 1;
+  const auto random = [&](uint32_t below) {
+    seed = seed * 1664525u + 1013904223u;
+    return (seed >> 8) % below;
+  };
+  std::vector<HostObject*> live;
+  const auto change = [&] {
+    const uint32_t what = random(6);
+    if (what < 3) {  // a new object, or one already in some list, into one of the three
+      HostObject* object = nullptr;
+      if (live.empty() || random(2) == 0) {
+        object = live.emplace_back(host.AddObject(0, 0, 32, {static_cast<int16_t>(random(8)), 0}));
+      } else {
+        object = live[random(static_cast<uint32_t>(live.size()))];
+      }
+      host.Action(static_cast<int>(what), Ref(object));  // AddAnchor, AddLink or AddPlatform
+    } else if (what == 3 && !live.empty()) {
+      const uint32_t doomed = random(static_cast<uint32_t>(live.size()));
+      host.Destroy(live[doomed]);
+      live.erase(live.begin() + doomed);
+    }
+  };
+  host.onEvent = [&](int32_t, int32_t) {
+    check();
+    for (int i = 0; i < 2; ++i) change();
+    check();
+  };
+  for (int frame = 0; frame < 40; ++frame) {
+    for (int i = 0; i < 4; ++i) change();
+    check();
+    host.Action(action::StartAll);
+    host.RunFrame();
+    check();
+  }
+}
+
 }  // namespace

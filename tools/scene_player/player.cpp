@@ -110,10 +110,9 @@ void Player::PlayFrame(int frame) {
     RunSteps(entry.steps);
   }
   host_.RunFrame();
-  // The host may free an object as soon as the frame in which it was
-  // destroyed has been handled (this one frees those destroyed before the
-  // handle call, and those destroyed by rules during it a frame later), so
-  // every destroyed object is forgotten now and never touched again.
+  // The host frees every object destroyed in this frame, by the timeline or
+  // by rules during it, once this frame's handle call has run: each is
+  // forgotten now and never touched again.
   for (std::size_t i = 0; i < objects_.size(); ++i) {
     if (objects_[i].state == State::Destroyed) Forget(i);
   }

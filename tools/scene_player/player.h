@@ -34,8 +34,8 @@ class Player {
   // The host object of scene object `index`, or null while it is not on the
   // frame (not yet created, or destroyed).
   const HostObject* live(std::size_t index) const;
-  // The scene object that `object` is, or -1. During a frame this also finds
-  // the objects destroyed in it.
+  // The scene object that `object` is, or -1. Also finds objects destroyed in
+  // this frame, which stay readable until its handle call has run.
   int IndexOf(const HostObject* object) const;
 
  private:
