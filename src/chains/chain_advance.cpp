@@ -10,9 +10,6 @@
 
 namespace {
 
-// 3.14159 / 180: the degree factor the chains have always used. It is a
-// little short of pi / 180, so angle 0 does not hang exactly below the anchor.
-constexpr double kDegree = 0.017453277777777776;
 constexpr double kPlacementOffset = 90.0;       // angle 0 hangs straight down
 constexpr uint32_t kExactFloatIntegers = 1u << 24;  // every integer up to here is a float
 constexpr double kDirectionStep = 0.08888888888888889;  // 32 directions per 360 degrees

@@ -9,6 +9,12 @@
 #include <cstdint>
 #include <limits>
 
+// 3.14159 / 180: the degree factor the chains have always used. It is a
+// little short of pi / 180, so angle 0 does not hang exactly below the
+// anchor. The editor's preview uses it too, so that it puts the platform
+// where a chain with the same settings hangs.
+constexpr double kDegree = 0.017453277777777776;
+
 // Rounds to the nearest float; a value beyond the float range becomes an
 // infinity of its sign, as IEEE rounding would make it.
 inline float RoundToFloat(double value) {

@@ -14,9 +14,6 @@
 
 namespace {
 
-// 3.14159 / 180, the degree factor of the run-time chains: the preview puts
-// the platform where a chain with these settings would hang.
-constexpr double kDegree = 0.017453277777777776;
 
 // A stored record may hold any 32-bit sizes. The host works them out in
 // 32-bit registers, where sums and products wrap; unsigned arithmetic gives
