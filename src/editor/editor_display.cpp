@@ -14,7 +14,6 @@
 
 namespace {
 
-
 // A stored record may hold any 32-bit sizes. The host works them out in
 // 32-bit registers, where sums and products wrap; unsigned arithmetic gives
 // the same bits without signed overflow.
