@@ -18,8 +18,10 @@ done
 step "playing the demo scene into out/demo.gif"
 mkdir -p out
 build/release/tools/scene_player/scene_player --gif out/demo.gif
+# Placed 40 pixels in, so that the leftmost label, which reaches past the
+# object's rectangle, is in the picture too.
 step "rendering the editor's template view into out/editor-preview.png"
-build/release/tools/editor_preview/editor_preview --view-template 1 out/editor-preview.png
+build/release/tools/editor_preview/editor_preview --view-template 1 --left 40 out/editor-preview.png
 echo "tavrin.dll (for the host):  $(pwd)/build/mingw-i686/tavrin.dll"
 echo "libtavrin.so (native):      $(pwd)/build/release/libtavrin.so"
 echo "the demo, played:           $(pwd)/out/demo.gif"
