@@ -17,12 +17,11 @@
 
 namespace {
 
-TEST(GetInfos, AnswersTheInterfaceQueries) {
+// The tables themselves, null-terminated, are checked at compile time.
+TEST(Description, AnswersTheInterfaceQueriesAndDescribesTheExtension) {
   const std::pair<int32_t, uint32_t> answers[] = {{0, 0x300u}, {2, 0x100u}, {1, 0u}, {3, 0u}, {-1, 0u}};
   for (const auto& [query, answer] : answers) EXPECT_EQ(GetInfos(query), answer) << query;
-}
-
-TEST(RunInfoRecord, DescribesTheExtension) {
+  EXPECT_EQ(GetRunObjectDataSize(nullptr, nullptr), sizeof(void*) == 8 ? 232u : 216u);
   RunInfo info;
   std::memset(&info, 0xAB, sizeof info);
   EXPECT_EQ(GetRunObjectInfos(nullptr, &info), 1);
@@ -32,13 +31,8 @@ TEST(RunInfoRecord, DescribesTheExtension) {
             (std::vector<int>{2, 16, 17, 100, 0, 100, 0, 1}));
   // The identifier's bytes hold its characters last to first.
   EXPECT_EQ(std::string(reinterpret_cast<const char*>(&info.identifier), 4), "NRVT");
-  // The tables themselves, null-terminated, are checked at compile time.
   EXPECT_TRUE(info.conditionRoutines == kConditionRoutines && info.actionRoutines == kActionRoutines &&
               info.expressionRoutines == kExpressionRoutines);
-}
-
-TEST(Layout, RunDataSizeIsWhatTheHostAllocates) {
-  EXPECT_EQ(GetRunObjectDataSize(nullptr, nullptr), sizeof(void*) == 8 ? 232u : 216u);
 }
 
 TEST(Layout, ObjectIdentifierSignExtendsTheLowHalf) {
@@ -88,20 +82,6 @@ TEST(CreateRunObject, ConvertsEachSettingTextForTheChainsToCome) {
               (std::vector<float>{c.values[0], c.values[1], c.values[3], 0.0f, 0.0f}));
     EXPECT_EQ(chain.swinging, 0);
   }
-}
-
-TEST(DestroyRunObject, ReleasesTheListsAndToleratesMissingOnes) {
-  EditData edit{};
-  WriteEditDataDefaults(edit);
-  alignas(8) unsigned char storage[sizeof(RunData)] = {};
-  auto* rd = reinterpret_cast<RunData*>(storage);
-  ASSERT_EQ(CreateRunObject(rd, &edit, nullptr), 0);
-  EXPECT_EQ(DestroyRunObject(rd, 0), 0);
-  EXPECT_EQ(rd->links, nullptr);
-  EXPECT_EQ(rd->platforms, nullptr);
-  EXPECT_EQ(rd->chains, nullptr);
-  EXPECT_EQ(DestroyRunObject(rd, 0), 0);  // a second destruction finds nothing to do
-  EXPECT_EQ(HandleRunObject(rd), 0);      // a frame without lists changes nothing
 }
 
 }  // namespace
