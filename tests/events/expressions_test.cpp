@@ -123,7 +123,8 @@ TEST_F(ExpressionTest, MotionOfASwingingChainAndZeroForAnIndexThatAddressesNone)
 }
 
 // Platforms are searched before links and links before anchors; the place
-// comes from the links alone.
+// comes from the links alone. An identifier is the high half shifted left by
+// 16 plus the low half sign-extended.
 TEST_F(ExpressionTest, FirstListThatHoldsTheObjectGivesItsChain) {
   HostObject* a0 = Object(action::AddAnchor, 100);
   Object(action::AddAnchor, 101);
@@ -134,12 +135,13 @@ TEST_F(ExpressionTest, FirstListThatHoldsTheObjectGivesItsChain) {
   Object(action::AddLink, -1, 1);  // link 6, past the last chain; identifier 65535
   Object(action::AddPlatform, 300);
   Object(action::AddPlatform, 301);  // platform 2, for a chain that is not there
+  Object(action::AddPlatform, -32768, 0xFFFF);  // identifier 0xFFFF0000 - 32768 in 32 bits: -98304
   ASSERT_EQ(host.Expression(expression::ChainLinks), 3);
 
   const struct {
     int32_t id, chain, place;
   } cases[] = {{200, 0, 0}, {202, 0, 2}, {203, 1, 0}, {100, 1, 1}, {205, 0, 2}, {101, 1, -1}, {300, 1, -1},
-               {301, 2, -1}, {65535, 2, 0},
+               {301, 2, -1}, {65535, 2, 0}, {-98304, 3, -1},
                // The halves joined without sign extension; an object in no list.
                {0x1FFFF, -1, -1}, {7, -1, -1}};
   for (const auto& c : cases) EXPECT_EQ(Lookup(c.id), std::make_pair(c.chain, c.place)) << c.id;
