@@ -7,7 +7,6 @@
 
 #include <cstdint>
 #include <cstdio>
-#include <cstring>
 #include <string>
 
 #include "frame/host_services.h"
@@ -17,18 +16,15 @@ namespace catalogue_test {
 inline uint32_t g_hostVersion = 0;
 inline uint32_t TVCALL AnswerVersion() { return g_hostVersion; }
 
-// Version 2.0, build 218: the oldest host that can show the object, so
-// every test that uses it also proves the boundary is inclusive.
-constexpr uint32_t kCompatibleVersion = 0x02000000u | 218u;
-
-// An editor-time host record whose version service answers `version`.
-inline EditorHost HostWithVersion(uint32_t version) {
+// An editor-time host record whose version service answers `version`. By
+// default version 2.0, build 218: the oldest host that can show the object,
+// so every test that uses it also proves the boundary is inclusive.
+inline EditorHost HostWithVersion(uint32_t version = 0x02000000u | 218u) {
   g_hostVersion = version;
   EditorHost host{};
   host.slot[kEditorSlotGetVersion] = reinterpret_cast<void*>(&AnswerVersion);
   return host;
 }
-inline EditorHost CompatibleHost() { return HostWithVersion(kCompatibleVersion); }
 
 // A text buffer of `size` bytes with guard bytes on both sides, all filled
 // with a sentinel so that any byte written shows.
@@ -40,17 +36,17 @@ class GuardedBuffer {
   explicit GuardedBuffer(std::size_t size) : size_(size), bytes_(kGuard + size + kGuard, kSentinel) {}
   char* data() { return bytes_.data() + kGuard; }
   int16_t size() const { return static_cast<int16_t>(size_); }
-
-  // The text up to its terminator; "<no terminator>" when none lies inside.
+  bool guardsIntact() const {
+    return bytes_.find_first_not_of(kSentinel) >= kGuard && bytes_.find_last_not_of(kSentinel) + 1 <= kGuard + size_;
+  }
+  // The text up to its terminator, "<no terminator>" when none lies inside,
+  // or "<untouched>" when no byte was written.
   std::string text() const {
+    if (bytes_.find_first_not_of(kSentinel) == std::string::npos) return "<untouched>";
     const std::string inside = bytes_.substr(kGuard, size_);
     const std::size_t end = inside.find('\0');
     return end == std::string::npos ? "<no terminator>" : inside.substr(0, end);
   }
-  bool guardsIntact() const {
-    return bytes_.find_first_not_of(kSentinel) >= kGuard && bytes_.find_last_not_of(kSentinel) + 1 <= kGuard + size_;
-  }
-  bool untouched() const { return bytes_.find_first_not_of(kSentinel) == std::string::npos; }
 
  private:
   std::size_t size_;
@@ -66,16 +62,14 @@ inline std::string DumpMenu(HMENU menu) {
     char text[256] = "";
     GetMenuStringA(menu, static_cast<UINT>(position), text, sizeof text, MF_BYPOSITION);
     dump += (position > 0 ? "|" : "") + std::string(text);
-    const UINT id = GetMenuItemID(menu, position);
-    if (id == 0xFFFFFFFFu) {
+    if (const UINT id = GetMenuItemID(menu, position); id == 0xFFFFFFFFu) {
       dump += "{" + DumpMenu(GetSubMenu(menu, position)) + "}";
-      continue;
-    }
-    dump += "=" + std::to_string(id);
-    if (const UINT state = GetMenuState(menu, static_cast<UINT>(position), MF_BYPOSITION); state != 0) {
-      char bits[32];
-      std::snprintf(bits, sizeof bits, " state=0x%X", state);
+    } else if (const UINT state = GetMenuState(menu, static_cast<UINT>(position), MF_BYPOSITION); state != 0) {
+      char bits[48];
+      std::snprintf(bits, sizeof bits, "=%u state=0x%X", id, state);
       dump += bits;
+    } else {
+      dump += "=" + std::to_string(id);
     }
   }
   return dump;

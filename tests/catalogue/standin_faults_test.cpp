@@ -22,13 +22,14 @@ class StandinFaults : public ::testing::Test {
     return StandinLiveMenuCount() == menusBefore_ && StandinLiveLocalBlockCount() == blocksBefore_;
   }
 
-  EditorHost host_ = catalogue_test::CompatibleHost();
+  EditorHost host_ = catalogue_test::HostWithVersion();
   const std::size_t menusBefore_ = StandinLiveMenuCount();
   const std::size_t blocksBefore_ = StandinLiveLocalBlockCount();
 };
 
 // The action menu copies its popup and three submenus through four scratch
-// buffers; the expression menu creates a popup and four submenus.
+// buffers; the expression menu creates a popup and four submenus. A menu
+// handed over is whole and live, and goes with its submenus.
 TEST_F(StandinFaults, MenuIsNullWhenAnyScratchBufferOrPopupIsMissingAndLeavesNothing) {
   const struct {
     void (*fail)(int, int);
@@ -37,11 +38,11 @@ TEST_F(StandinFaults, MenuIsNullWhenAnyScratchBufferOrPopupIsMissingAndLeavesNot
   } cases[] = {{StandinFailLocalAlloc, GetActionMenu, 4}, {StandinFailCreatePopupMenu, GetExpressionMenu, 5}};
   for (const auto& c : cases) {
     for (int successes = 0; successes <= c.needed; ++successes) {
-      SCOPED_TRACE(successes);
       c.fail(successes, 1);
       const HMENU menu = c.routine(&host_, nullptr, nullptr);
-      EXPECT_EQ(menu != nullptr && DestroyMenu(menu), successes == c.needed);  // with its submenus
-      EXPECT_TRUE(NothingLeftBehind());
+      const char* got = menu == nullptr ? "null" : DestroyMenu(menu) ? "a menu" : "a stale handle";
+      EXPECT_STREQ(got, successes == c.needed ? "a menu" : "null") << successes;
+      EXPECT_TRUE(NothingLeftBehind()) << successes;
       c.fail(0, 0);
     }
   }

@@ -1,5 +1,5 @@
-// The actions, run through the action table as the host runs them.
-#include <cmath>
+// The actions and conditions, run through their tables as the host runs them:
+// "On Swing" also from inside the events the swing step raises.
 #include <cstring>
 #include <limits>
 #include <vector>
@@ -25,126 +25,116 @@ class ActionTest : public EventTest {};
 
 TEST_F(ActionTest, AnchorsLinksAndPlatformsAddedInOrderFormTheChainsButANullIsNot) {
   for (int code : {action::AddAnchor, action::AddLink, action::AddPlatform}) EXPECT_EQ(host.Action(code, 0), 0);
-  HostObject* a = AddAnchor(100, 50);
-  HostObject* b = AddAnchor(300, 50);
+  HostObject* a = Add(action::AddAnchor, 100, 50);
+  HostObject* b = Add(action::AddAnchor, 300, 50);
   HostObject* links[4];
-  for (auto& link : links) link = AddLink(0, 0);
-  HostObject* p0 = AddPlatform(0, 0);
-  HostObject* p1 = AddPlatform(0, 0);
+  for (auto& link : links) link = Add(action::AddLink);
+  HostObject* p0 = Add(action::AddPlatform);
+  HostObject* p1 = Add(action::AddPlatform);
   host.Action(action::AddAnchor, Ref(a));  // the same anchor again: a third chain
 
   const RunData& rd = host.extension();
   ASSERT_EQ(rd.chains->Count(), 3u);
-  EXPECT_EQ(rd.links->Count(), 4u);
+  ASSERT_EQ(LinksPerChain(rd), 1u);  // 4 links over 3 chains
   EXPECT_EQ(rd.platforms->Count(), 2u);
-  EXPECT_EQ(Chain(0).anchor, a);
-  EXPECT_EQ(Chain(1).anchor, b);
-  EXPECT_EQ(Chain(2).anchor, a);
-  EXPECT_EQ(Chain(2).angle, 90.0f);
+  std::vector<HostObject*> chains;  // anchor, link and platform of each chain
+  for (uint32_t c = 0; c < 3; ++c) {
+    chains.insert(chains.end(), {Chain(c).anchor, LinkOfChain(rd, c, 1), PlatformOfChain(rd, c)});
+  }
+  EXPECT_EQ(chains, (std::vector<HostObject*>{a, links[0], p0, b, links[1], p1, a, links[2], nullptr}));
   EXPECT_EQ(a->changed, 0);  // adding moves nothing
-  ASSERT_EQ(LinksPerChain(rd), 1u);
-  for (uint32_t c = 0; c < 3; ++c) EXPECT_EQ(LinkOfChain(rd, c, 1), links[c]) << c;
-  EXPECT_EQ(PlatformOfChain(rd, 0), p0);
-  EXPECT_EQ(PlatformOfChain(rd, 1), p1);
-  EXPECT_EQ(PlatformOfChain(rd, 2), nullptr);
 }
 
-TEST_F(ActionTest, OnlyStartedChainsSwingAndStopChainLeavesTheOthers) {
-  for (int i = 0; i < 3; ++i) AddAnchor(100 * i, 50);
-  HostObject* platform = AddPlatform(7, 8);
-  const auto swinging = [&] { return std::vector<int>{Chain(0).swinging, Chain(1).swinging, Chain(2).swinging}; };
-  host.RunFrame();
-  EXPECT_EQ(platform->changed, 0);  // new chains rest until started
-  EXPECT_EQ(host.eventsRaised, 0);
+// Only started chains swing. "On Swing" is true inside the event for the
+// chain just moved, and after it until the next one: neither a frame in
+// which nothing swings nor an update changes the answer.
+TEST_F(ActionTest, OnlyStartedChainsSwingAndOnSwingNamesTheLastThatDid) {
+  for (int i = 0; i < 3; ++i) {
+    Add(action::AddAnchor, 100 * i, 50);
+    Add(action::AddLink);
+  }
+  HostObject* p0 = Add(action::AddPlatform, 7, 8);
+  HostObject* p1 = Add(action::AddPlatform, 7, 8);
+  const auto answers = [&](int code) {  // of the condition for chains 0, 1 and 2
+    std::vector<int32_t> row;
+    for (int32_t chain = 0; chain < 3; ++chain) row.push_back(host.Condition(code, chain) != 0);
+    return row;
+  };
+  host.RunFrame();  // new chains rest until started, and nothing has swung yet
+  EXPECT_EQ(p0->changed, 0);
+  EXPECT_EQ(host.Condition(condition::OnSwing, -1), 0);
+  EXPECT_EQ(answers(condition::OnSwing), (std::vector<int32_t>{0, 0, 0}));
 
   host.Action(action::StartAll);
-  host.Action(action::StopChain, 0);
-  EXPECT_EQ(swinging(), (std::vector<int>{0, 1, 1}));
+  host.Action(action::StopChain, 1);
+  EXPECT_EQ(answers(condition::ChainIsSwinging), (std::vector<int32_t>{1, 0, 1}));
+  std::vector<std::vector<int32_t>> during;
+  host.onEvent = [&](int32_t code, int32_t param) {
+    EXPECT_TRUE(code == condition::OnSwing && param == 0);
+    during.push_back(answers(condition::OnSwing));
+  };
   host.RunFrame();
-  EXPECT_EQ(host.eventsRaised, 2);
-  EXPECT_EQ(platform->changed, 0);  // the platform of the stopped chain 0
+  EXPECT_EQ(during, (std::vector<std::vector<int32_t>>{{1, 0, 0}, {0, 0, 1}}));
+  EXPECT_TRUE(p0->changed != 0 && p1->changed == 0);
 
   host.Action(action::StopAll);
+  host.RunFrame();
+  host.Action(action::UpdateChain, 0);
+  EXPECT_EQ(answers(condition::OnSwing), (std::vector<int32_t>{0, 0, 1}));
   host.Action(action::StartChain, 2);
   host.Action(action::StartChain, 2);  // starting a swinging chain changes nothing
-  EXPECT_EQ(swinging(), (std::vector<int>{0, 0, 1}));
+  EXPECT_EQ(answers(condition::ChainIsSwinging), (std::vector<int32_t>{0, 0, 1}));
 }
 
+// Where arguments are 64 bits wide, only their low half holds the index and
+// the position.
 TEST_F(ActionTest, SetAnchorWritesTheAnchorsPositionAndNothingElse) {
-  HostObject* anchor = AddAnchor(100, 50);
+  HostObject* anchor = Add(action::AddAnchor, 100, 50);
   // Sentinel bytes everywhere but in the host's own pointer to its services.
-  std::vector<unsigned char> expected(sizeof(HostObject), 0xA5);
-  std::memcpy(expected.data() + offsetof(HostObjectHeader, context), &anchor->head.context, sizeof(void*));
-  std::memcpy(anchor, expected.data(), sizeof(HostObject));
+  HostObject expected;
+  std::memset(&expected, 0xA5, sizeof expected);
+  expected.head.context = anchor->head.context;
+  std::memcpy(anchor, &expected, sizeof expected);
 
-  host.Action(action::SetAnchorX, 0, 0x01020304);
+  const auto high = static_cast<intptr_t>(int64_t{5} << 32);  // 0 where arguments are 32 bits wide
+  host.Action(action::SetAnchorX, high, high + 0x01020304);
   host.Action(action::SetAnchorY, 0, -2);
-  const int32_t x = 0x01020304, y = -2, changed = 1;
-  std::memcpy(expected.data() + offsetof(HostObjectHeader, x), &x, 4);
-  std::memcpy(expected.data() + offsetof(HostObjectHeader, y), &y, 4);
-  std::memcpy(expected.data() + offsetof(HostObject, changed), &changed, 4);
-  EXPECT_EQ(std::memcmp(anchor, expected.data(), sizeof(HostObject)), 0);
+  host.Action(action::SetAnchorY, high - 1, 77);  // low half -1: no chain
+  expected.head.x = 0x01020304;
+  expected.head.y = -2;
+  expected.changed = 1;
+  EXPECT_EQ(std::memcmp(anchor, &expected, sizeof expected), 0);
 }
 
 // Every action that takes an index does nothing with one that addresses no
-// chain, with no chains at all or with two; the float setters still ask for
-// their value, once.
+// chain, with no chains at all or with two, and the conditions are false;
+// the float setters still ask for their value, once.
 TEST_F(ActionTest, IndexThatAddressesNoChainChangesNothing) {
   constexpr int32_t kMin = std::numeric_limits<int32_t>::min(), kMax = std::numeric_limits<int32_t>::max();
   const int indexed[] = {action::SetAnchorX, action::SetAnchorY, action::SetMass, action::SetAngle,
                          action::SetSpeed, action::SetLinkSpacing, action::StartChain, action::StopChain,
                          action::UpdateChain, action::SetAcceleration};
   for (int chains = 0; chains <= 2; chains += 2) {
-    for (int i = 0; i < chains; ++i) AddAnchor(100 + 200 * i, 50);
+    for (int i = 0; i < chains; ++i) Add(action::AddAnchor, 100 + 200 * i, 50);
     host.Action(action::StopAll);  // commands on no chains do nothing either
     host.Action(action::UpdateAll);
     host.Action(action::StartAll);
     const std::vector<unsigned char> before = ChainBytes(host.extension());
-    for (int code : indexed) {
-      for (int32_t index : {-1, chains, kMin, kMax}) {
-        SCOPED_TRACE(testing::Message() << "code " << code << " index " << index << " of " << chains);
+    for (int32_t index : {-1, chains, kMin, kMax}) {
+      SCOPED_TRACE(testing::Message() << "index " << index << " of " << chains);
+      EXPECT_EQ(host.Condition(condition::ChainIsSwinging, index), 0);
+      EXPECT_EQ(host.Condition(condition::OnSwing, index), 0);
+      for (int code : indexed) {
         const int calls = host.floatParameterCalls;
         EXPECT_EQ(host.ActionWithValue(code, index, 12.5f), 0);
         const bool floatSetter = (code >= action::SetMass && code <= action::SetLinkSpacing) ||
                                  code == action::SetAcceleration;
-        EXPECT_EQ(host.floatParameterCalls, calls + (floatSetter ? 1 : 0));
+        EXPECT_EQ(host.floatParameterCalls, calls + (floatSetter ? 1 : 0)) << "code " << code;
       }
     }
     EXPECT_EQ(ChainBytes(host.extension()), before);
     EXPECT_EQ(host.extension().chains->Count(), static_cast<uint32_t>(chains));
   }
-}
-
-// Where arguments are 64 bits wide, only the low half holds the index.
-TEST_F(ActionTest, IndexIsTheLowHalfOfAWideArgument) {
-  if constexpr (sizeof(intptr_t) < 8) GTEST_SKIP() << "arguments are 32 bits wide";
-  AddAnchor(100, 50);
-  host.Action(action::StartChain, static_cast<intptr_t>(0x1'0000'0000));  // low half 0: chain 0
-  host.Action(action::StopChain, static_cast<intptr_t>(0x1'ffff'ffff));   // low half -1: no chain
-  EXPECT_EQ(Chain(0).swinging, 1);
-  host.Action(action::SetAnchorX, static_cast<intptr_t>(0x7'0000'0000), static_cast<intptr_t>(0x5'0000'0040));
-  EXPECT_EQ(Chain(0).anchor->head.x, 64);
-}
-
-TEST_F(ActionTest, SetAccelerationIsAddedToTheSpeedByTheNextUpdateOnly) {
-  HostObject* anchor = AddAnchor(100, 50);
-  AddLink(0, 0, 32);
-  HostObject* platform = AddPlatform(0, 0);
-  host.ActionWithValue(action::SetAcceleration, 0, 5.0f);
-  host.Action(action::UpdateChain, 0);
-
-  // One link of 32 pixels: the chain is 64 long; at rest at 90 degrees, the
-  // update adds the 5 to the speed and the speed to the angle.
-  const ChainRecord& c = Chain(0);
-  EXPECT_EQ(c.speed, 5.0f);
-  EXPECT_EQ(c.angle, 95.0f);
-  const double gravity = static_cast<double>(9.81f);
-  EXPECT_EQ(c.acceleration, static_cast<float>(std::sin(95.0 * kDegree) * (-(gravity * 1.0) / 64)));
-  const double theta = (95.0 + 90.0) * kDegree;
-  EXPECT_EQ(c.platformX, static_cast<float>(std::cos(theta) * 64 + anchor->head.x));
-  EXPECT_EQ(platform->head.x, static_cast<int32_t>(c.platformX));
-  EXPECT_EQ(c.swinging, 0);  // an update does not start the chain
-  EXPECT_EQ(host.eventsRaised, 0);
 }
 
 }  // namespace

@@ -27,34 +27,29 @@ enum : int {
 };
 }  // namespace expression
 
-// The degree factor of the chains: 3.14159 / 180.
-constexpr double kDegree = 3.14159 / 180.0;
-
-inline EditData DefaultSettings() {
-  EditData settings{};
-  WriteEditDataDefaults(settings);  // start angle 90, mass 1, gravity 9.81, spacing 0
-  return settings;
-}
-
 class EventTest : public ::testing::Test {
  protected:
   // An object parameter is the address of the object's host record.
   static intptr_t Ref(HostObject* object) { return reinterpret_cast<intptr_t>(object); }
 
-  // Adds a new object through the action `code`. Identifiers are distinct,
-  // so a search can only find the object it is given.
-  HostObject* Add(int code, int32_t x, int32_t y, int32_t height = 32) {
-    HostObject* object = host.AddObject(x, y, height, {static_cast<int16_t>(++lastId_), 0});
+  // Adds a new object through the action `code`. Unless one is given, each
+  // gets an identifier of its own, so a search can only find the object it
+  // is given.
+  HostObject* Add(int code, int32_t x = 0, int32_t y = 0, int32_t height = 32, standin::ObjectId id = {}) {
+    if (id.low == 0 && id.high == 0) id.low = static_cast<int16_t>(++lastId_);
+    HostObject* object = host.AddObject(x, y, height, id);
     host.Action(code, Ref(object));
     return object;
   }
-  HostObject* AddAnchor(int32_t x, int32_t y) { return Add(action::AddAnchor, x, y); }
-  HostObject* AddLink(int32_t x, int32_t y, int32_t height = 32) { return Add(action::AddLink, x, y, height); }
-  HostObject* AddPlatform(int32_t x, int32_t y) { return Add(action::AddPlatform, x, y); }
-
   const ChainRecord& Chain(uint32_t index) { return host.extension().chains->At(index); }
 
-  standin::Host host{DefaultSettings()};
+  // The stored defaults: start angle 90, mass 1, gravity 9.81, spacing 0.
+  static EditData Defaults() {
+    EditData settings{};
+    WriteEditDataDefaults(settings);
+    return settings;
+  }
+  standin::Host host{Defaults()};
 
  private:
   int lastId_ = 0;

@@ -2,10 +2,8 @@
 // served by the host: those that read chains and the positions of their
 // objects, and "ChainIndex(" and "LinkIndex(", which find the chain, and the
 // place in it, of an object given by its identifier.
-#include <cmath>
 #include <limits>
 #include <utility>
-#include <vector>
 
 #include "event_scene.h"
 
@@ -19,20 +17,31 @@ bool IsFloatExpression(int code) {
          (code >= expression::DeltaX && code <= expression::ChainAccel);
 }
 
-class ChainExpressionTest : public EventTest {
+class ExpressionTest : public EventTest {
  protected:
   // Three chains, two links each (one spare link), two platforms.
   void BuildThreeChains() {
-    for (int i = 0; i < 3; ++i) AddAnchor(100 + 100 * i, 40 + i);
-    for (int i = 0; i < 7; ++i) AddLink(1000 + i, 2000 + i, 16);
-    for (int i = 0; i < 2; ++i) AddPlatform(500 + i, 600 + i);
+    for (int i = 0; i < 3; ++i) Add(action::AddAnchor, 100 + 100 * i, 40 + i);
+    for (int i = 0; i < 7; ++i) Add(action::AddLink, 1000 + i, 2000 + i, 16);
+    for (int i = 0; i < 2; ++i) Add(action::AddPlatform, 500 + i, 600 + i);
+  }
+  HostObject* Object(int code, int16_t low, uint16_t high = 0) { return Add(code, 0, 0, 32, {low, high}); }
+  // "ChainIndex(" and "LinkIndex(" of `id`; each reads its one parameter
+  // and gives an integer.
+  std::pair<int32_t, int32_t> Lookup(int32_t id) {
+    const int reads = host.expressionParameterReads;
+    const std::pair<int32_t, int32_t> found = {host.Expression(expression::ChainIndex, {id}),
+                                               host.Expression(expression::LinkIndex, {id})};
+    EXPECT_EQ(host.expressionParameterReads, reads + 2);
+    EXPECT_FALSE(host.lastResultWasFloat());
+    return found;
   }
 };
 
 // The setters take their value from the float parameter, not the integer
 // one, and ask for it once; the expressions read it back from the chain.
-TEST_F(ChainExpressionTest, ReadTheAddressedChainAsSetAndMarkOnlyFloatsAsFloats) {
-  AddLink(0, 0);
+TEST_F(ExpressionTest, ReadTheAddressedChainAndItsObjectsAndMarkOnlyFloatsAsFloats) {
+  Add(action::AddLink);
   EXPECT_EQ(host.Expression(expression::ChainNum), 0);
   EXPECT_EQ(host.Expression(expression::ChainLinks), 0);  // no chains: no link belongs to one
   EXPECT_EQ(host.Expression(expression::LinkX, {0, 0}), 0);
@@ -43,8 +52,7 @@ TEST_F(ChainExpressionTest, ReadTheAddressedChainAsSetAndMarkOnlyFloatsAsFloats)
   const struct {
     int setter, expression;
     float value;
-  } fields[] = {{action::SetMass, expression::PlatformMass, 2.5f},
-                {action::SetAngle, expression::ChainAngle, -30.25f},
+  } fields[] = {{action::SetMass, expression::PlatformMass, 2.5f}, {action::SetAngle, expression::ChainAngle, -30.25f},
                 {action::SetSpeed, expression::ChainSpeed, 0.125f},
                 {action::SetLinkSpacing, expression::LinkSpacing, 3.75f},
                 {action::SetAcceleration, expression::ChainAccel, -2.75f}};
@@ -60,18 +68,33 @@ TEST_F(ChainExpressionTest, ReadTheAddressedChainAsSetAndMarkOnlyFloatsAsFloats)
   EXPECT_EQ(host.Expression(expression::AnchorY, {2}), 42);
   EXPECT_EQ(host.Expression(expression::PlatformX, {1}), 501);
   EXPECT_EQ(host.Expression(expression::PlatformY, {0}), 600);
+  // Link place k of chain c is links entry 2c + k, after the one added first.
+  EXPECT_EQ(host.Expression(expression::LinkX, {0, 1}), 1000);
+  EXPECT_EQ(host.Expression(expression::LinkY, {1, 1}), 2002);
+  EXPECT_EQ(host.Expression(expression::LinkX, {2, 1}), 1004);
+  // Out of range: 0, with both parameters read whatever they hold.
+  const std::pair<int32_t, int32_t> outside[] = {{1, 2}, {1, -1}, {3, 0}, {-1, 0}, {kMin, 0},
+                                                 {kMax, 0}, {0, kMax}, {0, kMin}, {kMax, kMax}, {kMin, kMin}};
+  for (const auto& [chain, place] : outside) {
+    for (int code : {expression::LinkX, expression::LinkY}) {
+      const int reads = host.expressionParameterReads;
+      EXPECT_EQ(host.Expression(code, {chain, place}), 0) << code << ": " << chain << ", " << place;
+      EXPECT_EQ(host.expressionParameterReads, reads + 2);
+    }
+  }
   for (int code = 0; code < kExpressionCount; ++code) {
     host.Expression(code, {0, 0});
     EXPECT_EQ(host.lastResultWasFloat(), IsFloatExpression(code)) << "expression " << code;
   }
 }
 
-// A bad chain index gives 0 (of its type); a bad platform index the
-// extension's own position. The parameter is read all the same.
-TEST_F(ChainExpressionTest, IndexThatAddressesNoChainYieldsZeroAndStillReadsTheParameter) {
+// Out of range, a chain index gives 0 (of its type) and a platform index the
+// extension's own position; the parameter is read all the same.
+TEST_F(ExpressionTest, MotionOfASwingingChainAndZeroForAnIndexThatAddressesNone) {
   BuildThreeChains();  // two platforms for three chains
   host.Action(action::StartAll);
-  host.RunFrame();  // every chain has moved: its deltas and acceleration are not 0
+  // Two steps: every chain has moved, and from a place away from the origin.
+  for (int frame = 0; frame < 2; ++frame) host.RunFrame();
   host.extension().head.x = 321;
   host.extension().head.y = -654;
   for (int code = expression::AnchorX; code <= expression::ChainAccel; ++code) {
@@ -87,147 +110,55 @@ TEST_F(ChainExpressionTest, IndexThatAddressesNoChainYieldsZeroAndStillReadsTheP
       EXPECT_EQ(host.expressionParameterReads, reads + 1);
     }
   }
+  // In range, how far the platform moved in the last step and the
+  // acceleration; a stopped chain reports no motion, whatever its record holds.
+  const ChainRecord& c = Chain(1);
+  const float motion[] = {c.platformX - c.prevPlatformX, c.platformY - c.prevPlatformY, c.acceleration};
+  for (int i = 0; i < 3; ++i) {
+    ASSERT_NE(motion[i], 0.0f);
+    EXPECT_EQ(host.ExpressionFloat(expression::DeltaX + i, {1}), motion[i]) << i;
+  }
+  host.Action(action::StopChain, 1);
+  for (int i = 0; i < 3; ++i) EXPECT_EQ(host.Expression(expression::DeltaX + i, {1}), 0) << i;
 }
 
-// One link of 5 pixels makes a chain 10 long. At an angle whose cosine is 0
-// the platform hangs at the anchor's x; at one whose cosine is -1/4 it stands
-// 2.5 pixels to the left. Near x 100 a float resolves 2^-17, far finer than
-// how close the nearest float angles come, so both positions are exact.
-// A stopped chain reports no motion, whatever its record still holds.
-TEST_F(ChainExpressionTest, DeltasAreHowFarThePlatformMovedInTheLastStepOfASwingingChain) {
-  const auto angleWithCosine = [](double cosine) {
-    return static_cast<float>(std::acos(cosine) / kDegree - 90.0);
-  };
-  AddAnchor(100, 50);
-  AddLink(0, 0, 5);
-  AddPlatform(0, 0);
-  host.ActionWithValue(action::SetAngle, 0, angleWithCosine(0.0));
-  host.Action(action::StartChain, 0);
-  host.RunFrame();
-  ASSERT_EQ(Chain(0).platformX, 100.0f);
-  // The first step is measured from the record's initial 0.
-  EXPECT_EQ(host.ExpressionFloat(expression::DeltaX, {0}), 100.0f);
-
-  const float angle = angleWithCosine(-0.25);
-  host.ActionWithValue(action::SetAngle, 0, angle);
-  host.ActionWithValue(action::SetAcceleration, 0, 0.0f);  // keep the angle where it was set
-  host.RunFrame();
-  const ChainRecord& c = Chain(0);
-  EXPECT_EQ(c.angle, angle);
-  EXPECT_EQ(host.ExpressionFloat(expression::DeltaX, {0}), -2.5f);
-  EXPECT_TRUE(host.lastResultWasFloat());
-  ASSERT_NE(c.platformY - c.prevPlatformY, 0.0f);
-  EXPECT_EQ(host.ExpressionFloat(expression::DeltaY, {0}), c.platformY - c.prevPlatformY);
-  ASSERT_NE(c.acceleration, 0.0f);
-  EXPECT_EQ(host.ExpressionFloat(expression::ChainAccel, {0}), c.acceleration);
-
-  host.Action(action::StopChain, 0);
-  for (int code : {expression::DeltaX, expression::DeltaY, expression::ChainAccel}) {
-    EXPECT_EQ(host.Expression(code, {0}), 0) << code;
-    EXPECT_TRUE(host.lastResultWasFloat());
-  }
-  EXPECT_EQ(host.ExpressionFloat(expression::ChainAngle, {0}), angle);
-}
-
-TEST_F(ChainExpressionTest, LinkPositionByChainAndPlaceWithinBoundsOnly) {
-  AddAnchor(0, 0);
-  AddAnchor(0, 0);
-  for (int i = 0; i < 7; ++i) AddLink(10 + i, 20 + i);  // three per chain; the seventh in none
-  EXPECT_EQ(host.Expression(expression::LinkX, {1, 2}), 15);  // links entry 5
-  EXPECT_EQ(host.Expression(expression::LinkY, {1, 2}), 25);
-  EXPECT_EQ(host.Expression(expression::LinkX, {0, 0}), 10);
-  const std::pair<int32_t, int32_t> outside[] = {{1, 3},    {1, -1},   {2, 0},    {-1, 0},     {kMin, 0},
-                                                 {kMax, 0}, {0, kMax}, {0, kMin}, {kMax, kMax}, {kMin, kMin}};
-  for (const auto& [chain, place] : outside) {
-    for (int code : {expression::LinkX, expression::LinkY}) {
-      SCOPED_TRACE(testing::Message() << "expression " << code << " chain " << chain << " place " << place);
-      const int reads = host.expressionParameterReads;
-      EXPECT_EQ(host.Expression(code, {chain, place}), 0);
-      EXPECT_EQ(host.expressionParameterReads, reads + 2);
-    }
-  }
-}
-
-class ObjectLookupTest : public EventTest {
- protected:
-  HostObject* Add(int code, int16_t low, uint16_t high = 0) {
-    HostObject* object = host.AddObject(0, 0, 32, {low, high});
-    host.Action(code, Ref(object));
-    return object;
-  }
-  int32_t ChainIndexOf(int32_t id) { return host.Expression(expression::ChainIndex, {id}); }
-  int32_t LinkIndexOf(int32_t id) { return host.Expression(expression::LinkIndex, {id}); }
-};
-
-TEST_F(ObjectLookupTest, SevenLinksOverTwoChainsAndObjectsInNoList) {
-  EXPECT_EQ(ChainIndexOf(7), -1);  // nothing at all yet
-  EXPECT_EQ(LinkIndexOf(7), -1);
-  Add(action::AddAnchor, 100);
-  Add(action::AddAnchor, 101);
-  for (int16_t i = 0; i < 7; ++i) Add(action::AddLink, static_cast<int16_t>(200 + i));
-  EXPECT_EQ(host.Expression(expression::ChainLinks), 3);
-
-  const int32_t chain[] = {0, 0, 0, 1, 1, 1, 2};  // the last link lies past the last chain
-  const int32_t place[] = {0, 1, 2, 0, 1, 2, 0};
-  for (int i = 0; i < 7; ++i) {
-    const int reads = host.expressionParameterReads;
-    EXPECT_EQ(ChainIndexOf(200 + i), chain[i]) << "link " << i;
-    EXPECT_EQ(LinkIndexOf(200 + i), place[i]) << "link " << i;
-    EXPECT_EQ(host.expressionParameterReads, reads + 2);
-    EXPECT_FALSE(host.lastResultWasFloat());
-  }
-  EXPECT_EQ(ChainIndexOf(101), 1);  // an anchor: its chain
-  EXPECT_EQ(LinkIndexOf(101), -1);  // but no place among the links
-  EXPECT_EQ(ChainIndexOf(7), -1);
-  EXPECT_EQ(LinkIndexOf(7), -1);
-}
-
-TEST_F(ObjectLookupTest, PlatformsAreSearchedBeforeLinksAndLinksBeforeAnchors) {
-  HostObject* a0 = Add(action::AddAnchor, 100);
-  Add(action::AddAnchor, 101);
-  for (int16_t i = 0; i < 4; ++i) Add(action::AddLink, static_cast<int16_t>(200 + i));
-  host.Action(action::AddLink, Ref(a0));           // anchor of chain 0, and link 4 (chain 1)
-  HostObject* p0 = Add(action::AddLink, 205);      // link 5 (chain 1), and platform 0
+// Platforms are searched before links and links before anchors; the place
+// comes from the links alone. An identifier is the high half shifted left by
+// 16 plus the low half sign-extended.
+TEST_F(ExpressionTest, FirstListThatHoldsTheObjectGivesItsChain) {
+  HostObject* a0 = Object(action::AddAnchor, 100);
+  Object(action::AddAnchor, 101);
+  for (int16_t i = 0; i < 4; ++i) Object(action::AddLink, static_cast<int16_t>(200 + i));
+  host.Action(action::AddLink, Ref(a0));          // anchor of chain 0, and link 4 (chain 1)
+  HostObject* p0 = Object(action::AddLink, 205);  // link 5 (chain 1), and platform 0
   host.Action(action::AddPlatform, Ref(p0));
-  Add(action::AddPlatform, 300);
-  Add(action::AddPlatform, 301);  // platform 2, for a chain that is not there
+  Object(action::AddLink, -1, 1);  // link 6, past the last chain; identifier 65535
+  Object(action::AddPlatform, 300);
+  Object(action::AddPlatform, 301);  // platform 2, for a chain that is not there
+  Object(action::AddPlatform, -32768, 0xFFFF);  // identifier 0xFFFF0000 - 32768 in 32 bits: -98304
+  ASSERT_EQ(host.Expression(expression::ChainLinks), 3);
 
-  EXPECT_EQ(ChainIndexOf(205), 0);
-  EXPECT_EQ(ChainIndexOf(100), 1);
-  EXPECT_EQ(LinkIndexOf(205), 2);  // the place comes from the links alone
-  EXPECT_EQ(ChainIndexOf(301), 2);
+  const struct {
+    int32_t id, chain, place;
+  } cases[] = {{200, 0, 0}, {202, 0, 2}, {203, 1, 0}, {100, 1, 1}, {205, 0, 2}, {101, 1, -1}, {300, 1, -1},
+               {301, 2, -1}, {65535, 2, 0}, {-98304, 3, -1},
+               // The halves joined without sign extension; an object in no list.
+               {0x1FFFF, -1, -1}, {7, -1, -1}};
+  for (const auto& c : cases) EXPECT_EQ(Lookup(c.id), std::make_pair(c.chain, c.place)) << c.id;
 }
 
-TEST_F(ObjectLookupTest, IdentifierJoinsTheHalvesWithTheLowOneSignExtended) {
-  Add(action::AddAnchor, 0);
-  Add(action::AddLink, -1, 1);
-  EXPECT_EQ(ChainIndexOf(65535), 0);
-  EXPECT_EQ(LinkIndexOf(65535), 0);
-  EXPECT_EQ(ChainIndexOf(0x1FFFF), -1);  // the halves joined without sign extension
-  EXPECT_EQ(LinkIndexOf(0x1FFFF), -1);
-
-  Add(action::AddPlatform, -2);  // a negative low half alone: -2
-  EXPECT_EQ(ChainIndexOf(-2), 0);
-  EXPECT_EQ(ChainIndexOf(0xFFFE), -1);
-}
-
-TEST_F(ObjectLookupTest, LinkIsInNoChainWhileThereAreFewerLinksThanChains) {
-  Add(action::AddLink, 200);
-  EXPECT_EQ(ChainIndexOf(200), -1);  // no chains at all
-  EXPECT_EQ(LinkIndexOf(200), -1);
-
-  Add(action::AddAnchor, 100);
-  HostObject* a1 = Add(action::AddAnchor, 101);
+TEST_F(ExpressionTest, LinkIsInNoChainWhileThereAreFewerLinksThanChains) {
+  Object(action::AddLink, 200);
+  EXPECT_EQ(Lookup(200), std::make_pair(-1, -1));  // no chains at all
+  Object(action::AddAnchor, 100);
+  HostObject* a1 = Object(action::AddAnchor, 101);
   ASSERT_EQ(host.Expression(expression::ChainLinks), 0);
-  EXPECT_EQ(ChainIndexOf(200), -1);
-  EXPECT_EQ(LinkIndexOf(200), -1);
-
+  EXPECT_EQ(Lookup(200), std::make_pair(-1, -1));
   // A link that also anchors a chain is found as that chain's anchor.
   host.Action(action::AddLink, Ref(a1));
-  Add(action::AddAnchor, 102);
+  Object(action::AddAnchor, 102);
   ASSERT_EQ(host.Expression(expression::ChainLinks), 0);
-  EXPECT_EQ(ChainIndexOf(101), 1);
-  EXPECT_EQ(LinkIndexOf(101), -1);
+  EXPECT_EQ(Lookup(101), std::make_pair(1, -1));
 }
 
 // The lists keep an index for these two lookups. Whatever changes the lists

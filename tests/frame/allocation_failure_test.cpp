@@ -43,33 +43,32 @@ auto FailingAfter(int succeeding, Call call) {
   return call();
 }
 
+// Three lists make the object. The later routines tolerate an object without
+// them, and destruction releases them, also twice over.
 TEST(AllocationFailure, CreationIsRefusedWholeWhenAnyListCannotBeMade) {
   EditData edit{};
   WriteEditDataDefaults(edit);
-  for (int succeeding = 0; succeeding < 3; ++succeeding) {
+  for (int succeeding = 0; succeeding <= 3; ++succeeding) {
+    SCOPED_TRACE(succeeding);
     alignas(8) unsigned char storage[sizeof(RunData)] = {};
     auto* rd = reinterpret_cast<RunData*>(storage);
-    EXPECT_EQ(FailingAfter(succeeding, [&] { return CreateRunObject(rd, &edit, nullptr); }), -1) << succeeding;
-    EXPECT_EQ(rd->links, nullptr);
-    EXPECT_EQ(rd->platforms, nullptr);
-    EXPECT_EQ(rd->chains, nullptr);
-    // Later routines tolerate the object without lists.
+    const auto lists = [rd] { return (rd->links != nullptr) + (rd->platforms != nullptr) + (rd->chains != nullptr); };
+    EXPECT_EQ(FailingAfter(succeeding, [&] { return CreateRunObject(rd, &edit, nullptr); }), succeeding < 3 ? -1 : 0);
+    EXPECT_EQ(lists(), succeeding < 3 ? 0 : 3);
     EXPECT_EQ(HandleRunObject(rd), 0);
-    EXPECT_EQ(DestroyRunObject(rd, 0), 0);
+    for (int destroy = 0; destroy < 2; ++destroy) EXPECT_EQ(DestroyRunObject(rd, 0), 0);
+    EXPECT_EQ(lists(), 0);
   }
 }
 
 TEST(AllocationFailure, AFailedAppendLeavesTheListAsItWas) {
   ObjectList list;
   HostObject a{}, b{}, c{};
-  ASSERT_TRUE(list.Append(&a));
-  ASSERT_TRUE(list.Append(&b));
+  ASSERT_TRUE(list.Append(&a) && list.Append(&b));
   // Two elements fill a vector's storage of two, so the third must grow it.
   EXPECT_FALSE(FailingAfter(0, [&] { return list.Append(&c); }));
   ASSERT_EQ(list.Count(), 2u);
-  EXPECT_EQ(list.At(0), &a);
-  EXPECT_EQ(list.At(1), &b);
-
+  EXPECT_TRUE(list.At(0) == &a && list.At(1) == &b);
   ChainList chains;
   EXPECT_FALSE(FailingAfter(0, [&] { return chains.Append(ChainRecord{}); }));
   EXPECT_EQ(chains.Count(), 0u);
