@@ -99,7 +99,7 @@ TEST(SetupDialog, NewObjectShowsTheDefaultsAndKeepsThemWhateverEndsIt) {
                  {{Press::Help, Press::Help, Press::Enter}, 0},
                  {{Press::Help, Press::Cancel}, -1}};
   for (const auto& ending : endings) {
-    EditorHost host = catalogue_test::CompatibleHost();
+    EditorHost host = catalogue_test::HostWithVersion();
     EditData edit = FreshRecord();
     std::string shown;
     int32_t result = 99;
@@ -112,7 +112,7 @@ TEST(SetupDialog, NewObjectShowsTheDefaultsAndKeepsThemWhateverEndsIt) {
 }
 
 TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
-  EditorHost host = catalogue_test::CompatibleHost();
+  EditorHost host = catalogue_test::HostWithVersion();
   EditData edit = FreshRecord();
   const auto typeAndOk = [](HWND dialog) {
     const std::pair<int, const char*> typed[] = {
@@ -157,7 +157,7 @@ TEST(SetupDialog, PopupOpensOnlyForItsCommandAndAnswersFourAfterOk) {
   } cases[] = {{2020, Press::Ok, 1, 4},     {2020, Press::Enter, 1, 4}, {2020, Press::Cancel, 1, 0},
                {2020, Press::Escape, 1, 0}, {2021, Press::Ok, 0, 0},    {0, Press::Ok, 0, 0}};
   for (const auto& c : cases) {
-    EditorHost host = catalogue_test::CompatibleHost();
+    EditorHost host = catalogue_test::HostWithVersion();
     EditData edit = Defaults();
     edit.linkCount = -7;
     const EditData before = edit;

@@ -165,7 +165,7 @@ TEST_F(ExpressionTest, LinkIsInNoChainWhileThereAreFewerLinksThanChains) {
 // (appends from inside "On Swing", objects destroyed and pruned, in the pass
 // or after it, an identifier in several lists or several times in one), the
 // answers must stay those of walking the lists from the start.
-TEST_F(ObjectLookupTest, AnswersAreThoseOfWalkingTheListsWhateverChangesThem) {
+TEST_F(ExpressionTest, LookupsAreThoseOfWalkingTheListsWhateverChangesThem) {
   RunData& rd = host.extension();
   const auto walk = [](ObjectList* list, int32_t id) -> int32_t {
     for (uint32_t i = 0; i < list->Count(); ++i) {
@@ -182,8 +182,8 @@ TEST_F(ObjectLookupTest, AnswersAreThoseOfWalkingTheListsWhateverChangesThem) {
       for (uint32_t i = 0; chain < 0 && i < rd.chains->Count(); ++i) {
         if (ObjectIdentifier(rd.chains->At(i).anchor->head) == id) chain = static_cast<int32_t>(i);
       }
-      ASSERT_EQ(ChainIndexOf(id), chain) << "identifier " << id;
-      ASSERT_EQ(LinkIndexOf(id), link >= 0 && perChain > 0 ? link % static_cast<int32_t>(perChain) : -1);
+      const int32_t place = link >= 0 && perChain > 0 ? link % static_cast<int32_t>(perChain) : -1;
+      ASSERT_EQ(Lookup(id), std::make_pair(chain, place)) << "identifier " << id;
     }
   };
   uint32_t seed = 1;

@@ -34,7 +34,7 @@ void CollectMenuTexts(HMENU menu, int16_t(TVCALL* codeFromMenu)(EditorHost*, int
 
 std::map<int, std::string> MenuTexts(HMENU(TVCALL* getMenu)(EditorHost*, void*, void*),
                                      int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t)) {
-  EditorHost host = catalogue_test::CompatibleHost();
+  EditorHost host = catalogue_test::HostWithVersion();
   std::map<int, std::string> texts;
   const HMENU menu = getMenu(&host, nullptr, nullptr);
   CollectMenuTexts(menu, codeFromMenu, host, texts);
@@ -52,7 +52,7 @@ uint16_t EntryWord(const void* entry, int index) {
 std::string Text(const char* text) { return text == nullptr ? "<none>" : text; }
 
 TEST(SceneNames, ActionTableMatchesTheCatalogue) {
-  EditorHost host = catalogue_test::CompatibleHost();
+  EditorHost host = catalogue_test::HostWithVersion();
   auto menus = MenuTexts(&GetActionMenu, &GetActionCodeFromMenu);
   for (int code = 0; code < scene_player::kActionNameCount; ++code) {
     const scene_player::ActionName& name = scene_player::kActionNames[code];
@@ -76,7 +76,7 @@ TEST(SceneNames, ActionTableMatchesTheCatalogue) {
 }
 
 TEST(SceneNames, ExpressionTableMatchesTheCatalogue) {
-  EditorHost host = catalogue_test::CompatibleHost();
+  EditorHost host = catalogue_test::HostWithVersion();
   auto menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
   for (int code = 0; code < scene_player::kExpressionNameCount; ++code) {
     const scene_player::ExpressionName& name = scene_player::kExpressionNames[code];
