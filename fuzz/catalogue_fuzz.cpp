@@ -13,33 +13,19 @@
 #include <vector>
 
 #include "frame/exports.h"
+#include "fuzz_input.h"
 #include "frame/host_services.h"
 #include "standin_win32.h"
 
 namespace {
 
-// A broken invariant stops the run and names itself.
-#define Check(condition) \
-  ((condition) ? (void)0 : (std::fprintf(stderr, "%s:%d: %s\n", __FILE__, __LINE__, #condition), std::abort()))
-
 uint32_t g_version = 0;
 uint32_t TVCALL AnswerVersion() { return g_version; }
 
-class Input {
+// The input, with menu ids of an event family as a number kind of its own.
+class Input : public FuzzInput {
  public:
-  Input(const uint8_t* data, size_t size) : data_(data), size_(size) {}
-  bool done() const { return pos_ >= size_; }
-  uint8_t Byte() { return pos_ < size_ ? data_[pos_++] : 0; }
-  int32_t Int() {
-    uint32_t value = 0;
-    for (int i = 0; i < 4; ++i) value = (value << 8) | Byte();
-    return static_cast<int32_t>(value);
-  }
-  // Mostly values near the interesting ones, sometimes any 32-bit value.
-  int32_t Near(int32_t base, int spread) {
-    const uint8_t b = Byte();
-    return b < 224 ? base + b % spread - 2 : Int();
-  }
+  using FuzzInput::FuzzInput;
   // Mostly the menu ids of `count` events numbered from `first` in steps of
   // 10, sometimes one beside them, sometimes any 32-bit value.
   int32_t MenuId(int32_t first, int count) {
@@ -47,11 +33,6 @@ class Input {
     if (b < 192) return first + 10 * (b % (count + 1));
     return b < 224 ? first + b % 20 - 2 : Int();
   }
-
- private:
-  const uint8_t* data_;
-  size_t size_;
-  size_t pos_ = 0;
 };
 
 

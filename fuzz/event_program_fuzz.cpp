@@ -16,35 +16,17 @@
 
 #include "chains/run_data.h"
 #include "frame/edit_data.h"
+#include "fuzz_input.h"
 #include "host.h"
 
 namespace {
 
-// A broken invariant stops the run and names itself.
-#define Check(condition) \
-  ((condition) ? (void)0 : (std::fprintf(stderr, "%s:%d: %s\n", __FILE__, __LINE__, #condition), std::abort()))
-
-class Program {
+// The program, with chain indexes as a number kind of its own.
+class Program : public FuzzInput {
  public:
-  Program(const uint8_t* data, size_t size) : data_(data), size_(size) {}
-
-  bool done() const { return pos_ >= size_; }
-  uint8_t Byte() { return pos_ < size_ ? data_[pos_++] : 0; }
-  int32_t Int() {
-    uint32_t value = 0;
-    for (int i = 0; i < 4; ++i) value = (value << 8) | Byte();
-    return static_cast<int32_t>(value);
-  }
+  using FuzzInput::FuzzInput;
   // Mostly small indexes, sometimes any 32-bit value.
-  int32_t Index() {
-    const uint8_t b = Byte();
-    return b < 240 ? static_cast<int32_t>(b % 8) - 1 : Int();
-  }
-
- private:
-  const uint8_t* data_;
-  size_t size_;
-  size_t pos_ = 0;
+  int32_t Index() { return Near(1, 8); }
 };
 
 class Run {

@@ -23,15 +23,12 @@
 #include "frame/edit_data.h"
 #include "frame/exports.h"
 #include "frame/host_services.h"
+#include "fuzz_input.h"
 #include "host.h"
 #include "resources/resource_ids.h"
 #include "standin_win32.h"
 
 namespace {
-
-// A broken invariant stops the run and names itself.
-#define Check(condition) \
-  ((condition) ? (void)0 : (std::fprintf(stderr, "%s:%d: %s\n", __FILE__, __LINE__, #condition), std::abort()))
 
 uint32_t TVCALL CompatibleVersion() { return 0x02000000u | 218u; }
 
