@@ -1,9 +1,7 @@
 // A fixed scene played for many frames gives the same bits on every build:
 // the native library and the Windows ones hash to one golden value. A change
 // of this value means results changed, on one build or on all.
-#include <bit>
 #include <cstdint>
-#include <cstdio>
 
 #include <gtest/gtest.h>
 
@@ -12,19 +10,11 @@
 
 namespace {
 
-class Fnv1a {
- public:
+struct Fnv1a {
+  uint64_t value = 0xCBF29CE484222325ull;
   void Add(uint32_t word) {
-    for (int i = 0; i < 4; ++i) {
-      hash_ = (hash_ ^ ((word >> (8 * i)) & 0xFFu)) * 0x100000001B3ull;
-    }
+    for (int i = 0; i < 4; ++i) value = (value ^ ((word >> (8 * i)) & 0xFFu)) * 0x100000001B3ull;
   }
-  void Add(float value) { Add(std::bit_cast<uint32_t>(value)); }
-  void Add(int32_t value) { Add(static_cast<uint32_t>(value)); }
-  uint64_t value() const { return hash_; }
-
- private:
-  uint64_t hash_ = 0xCBF29CE484222325ull;
 };
 
 uint64_t PlayFixedScene() {
@@ -52,18 +42,16 @@ uint64_t PlayFixedScene() {
     const ChainRecord& r = scene.Chain(c);
     for (float value : {r.mass, r.angle, r.speed, r.linkSpacing, r.prevPlatformX, r.prevPlatformY,
                         r.platformX, r.platformY, r.acceleration}) {
-      hash.Add(value);
+      hash.Add(Bits(value));
     }
   }
   for (ObjectList* list : {scene.rd.links, scene.rd.platforms}) {
     for (uint32_t i = 0; i < list->Count(); ++i) {
       const HostObject& object = *list->At(i);
-      hash.Add(object.head.x);
-      hash.Add(object.head.y);
-      hash.Add(object.direction);
+      for (int32_t value : {object.head.x, object.head.y, object.direction}) hash.Add(static_cast<uint32_t>(value));
     }
   }
-  return hash.value();
+  return hash.value;
 }
 
 TEST(Determinism, FixedSceneHashesToTheGoldenValueOnEveryBuild) {

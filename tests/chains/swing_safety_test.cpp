@@ -43,13 +43,15 @@ TEST(SwingSafety, NonFiniteValuesLeaveObjectsWhereTheyWere) {
     HostObject* platform = scene.Platform();
     scene.host.RunFrame();
     const int32_t linkX = link->head.x, linkY = link->head.y, platformX = platform->head.x;
+    link->direction = platform->direction = 5;
     scene.Chain(0).angle = poison;
     for (int frame = 0; frame < 3; ++frame) scene.host.RunFrame();
     UpdateAllChains(scene.rd);
     EXPECT_EQ(link->head.x, linkX);
     EXPECT_EQ(link->head.y, linkY);
     EXPECT_EQ(platform->head.x, platformX);
-    EXPECT_EQ(link->direction, 0);  // a direction from a non-finite angle stays
+    EXPECT_EQ(link->direction, 5);  // a non-finite angle turns nothing
+    EXPECT_EQ(platform->direction, 5);
   }
   ChainScene heavy;
   heavy.Anchor(0, 0, 1);

@@ -2,58 +2,20 @@
 // its answer to bad input.
 #include <cairo.h>
 #include <gtest/gtest.h>
-#include <sys/wait.h>
 
-#include <cstdlib>
-#include <filesystem>
-#include <fstream>
-#include <sstream>
 #include <string>
 #include <vector>
 
+#include "tools/tool_run.h"
+
 namespace {
 
-namespace fs = std::filesystem;
+using namespace tool_test;
 
-std::string ReadFile(const fs::path& path) {
-  std::ifstream file(path, std::ios::binary);
-  std::ostringstream text;
-  text << file.rdbuf();
-  return text.str();
-}
-
-struct ToolRun {
-  int status = -1;
-  std::string err;
-};
-
-class PreviewTest : public ::testing::Test {
- protected:
-  void SetUp() override {
-    std::string pattern = (fs::temp_directory_path() / "editor_preview_test.XXXXXX").string();
-    ASSERT_NE(mkdtemp(pattern.data()), nullptr);
-    folder_ = pattern;
-  }
-  void TearDown() override { fs::remove_all(folder_); }
-
-  ToolRun Preview(const std::vector<std::string>& args) {
-    std::string command = "exec '" EDITOR_PREVIEW "'";
-    for (const std::string& arg : args) command += " '" + arg + "'";
-    command += " 2>'" + (folder_ / "err").string() + "'";
-    const int status = std::system(command.c_str());
-    ToolRun run;
-    if (status != -1 && WIFEXITED(status)) run.status = WEXITSTATUS(status);
-    run.err = ReadFile(folder_ / "err");
-    return run;
-  }
-
-  fs::path folder_;
-};
-
-TEST_F(PreviewTest, TemplatePictureHasTheRectanglesWhereTheyAreDrawn) {
-  const fs::path png = folder_ / "template.png";
-  ASSERT_EQ(Preview({"--view-template", "1", png.string()}).status, 0);
-  cairo_surface_t* image = cairo_image_surface_create_from_png(png.c_str());
+TEST(EditorPreview, TemplatePictureHasTheRectanglesWhereTheyAreDrawn) {
+  Folder folder;
+  ASSERT_EQ(RunTool(EDITOR_PREVIEW, {"--view-template", "1", "template.png"}, folder).status, 0);
+  cairo_surface_t* image = cairo_image_surface_create_from_png((folder / "template.png").c_str());
   ASSERT_EQ(cairo_surface_status(image), CAIRO_STATUS_SUCCESS);
   EXPECT_EQ(cairo_image_surface_get_width(image), 768 + 64);
   const auto pixel = [&](int x, int y) {
@@ -75,33 +37,32 @@ TEST_F(PreviewTest, TemplatePictureHasTheRectanglesWhereTheyAreDrawn) {
   cairo_surface_destroy(image);
 }
 
-TEST_F(PreviewTest, BadInputIsNamedAndLeavesTheOutputAlone) {
-  std::ofstream(folder_ / "short.bin", std::ios::binary) << std::string(99, '\0');
-  const std::string saved = (folder_ / "saved.bin").string();
-  std::ofstream(saved, std::ios::binary) << std::string(100, '\0');
-  const std::string out = (folder_ / "out.png").string();
-  std::ofstream(out) << "old";
+TEST(EditorPreview, BadInputIsNamedAndLeavesTheOutputAlone) {
+  Folder folder;
+  folder.Write("short.bin", std::string(99, '\0'));
+  folder.Write("saved.bin", std::string(100, '\0'));
+  folder.Write("out.png", "old");
   const struct {
     std::vector<std::string> args;
     std::string message;
   } cases[] = {
-      {{"--settings", (folder_ / "none.bin").string(), out}, "cannot read settings file"},
-      {{"--settings", (folder_ / "short.bin").string(), out}, "holds 99 bytes, not 100"},
-      {{"--link-height", "12a", out}, "--link-height 12a: not a whole number"},
-      {{"--number-of-links", "2147483648", out}, "out of range"},
-      {{"--view-template", "256", out}, "out of range 0 to 255"},
-      {{"--starting-angle", "1234567890", out}, "at most 9 characters"},
-      {{"--colour", "1", out}, "unknown option --colour"},
-      {{"--settings", saved, saved}, "this is --settings"},
-      {{out, "--left"}, "--left needs a value"},
+      {{"--settings", "none.bin", "out.png"}, "cannot read settings file"},
+      {{"--settings", "short.bin", "out.png"}, "holds 99 bytes, not 100"},
+      {{"--link-height", "12a", "out.png"}, "--link-height 12a: not a whole number"},
+      {{"--number-of-links", "2147483648", "out.png"}, "out of range"},
+      {{"--view-template", "256", "out.png"}, "out of range 0 to 255"},
+      {{"--starting-angle", "1234567890", "out.png"}, "at most 9 characters"},
+      {{"--colour", "1", "out.png"}, "unknown option --colour"},
+      {{"--settings", "saved.bin", "saved.bin"}, "this is --settings"},
+      {{"out.png", "--left"}, "--left needs a value"},
       {{}, "no output file given"},
   };
   for (const auto& c : cases) {
-    const ToolRun run = Preview(c.args);
+    const ToolRun run = RunTool(EDITOR_PREVIEW, c.args, folder);
     EXPECT_EQ(run.status, 2) << c.message;
     EXPECT_NE(run.err.find(c.message), std::string::npos) << run.err;
     EXPECT_EQ(run.err.find('\n'), run.err.size() - 1) << run.err;
-    EXPECT_EQ(ReadFile(out), "old");
+    EXPECT_EQ(ReadFile(folder / "out.png"), "old");
   }
 }
 

@@ -4,6 +4,8 @@
 // are, and what DialogBoxParamA answers when it cannot show a dialog.
 #include <gtest/gtest.h>
 
+#include <cstdint>
+
 #include "catalogue/catalogue_helpers.h"
 #include "dialog_author.h"
 #include "editor/setup_dialog.h"
@@ -34,7 +36,8 @@ TEST(DialogCalls, TypedTextReadsAsASignedNumberAsUser32ReadsIt) {
     BOOL translated;
   } cases[] = {{"  5", 5, TRUE},          {"\t5", 5, TRUE},         {"+5", 5, TRUE},
                {"12abc", 12, TRUE},       {"5 6", 5, TRUE},         {"-0", 0, TRUE},
-               {"0x10", 0, TRUE},         {"-2147483647", -2147483647, TRUE},
+               {"0x10", 0, TRUE},         {"-2147483648", INT32_MIN, TRUE},
+               {"18446744073709551621", 0, FALSE},  // 2^64 + 5: no wrap-around
                {"2147483648", 0, FALSE},  {"-2147483649", 0, FALSE}, {"99999999999", 0, FALSE},
                {"", 0, FALSE},            {"abc", 0, FALSE},        {"- 5", 0, FALSE},
                {"+", 0, FALSE},

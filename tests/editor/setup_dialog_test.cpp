@@ -62,17 +62,13 @@ std::string Shown(HWND dialog) {
 const std::string kDefaultsShown =
     "1001=90 1002=1 1003=0 1004=9.81 1005=64 1006=32 1007=32 1008=32 1009=32 1010=32 1011=10 box=0";
 
-enum class Press { Ok, Enter, Cancel, Escape, Help };
-
-void Do(HWND dialog, Press press) {
-  switch (press) {
-    case Press::Ok: editor_test::Click(dialog, IDOK); break;
-    case Press::Enter: editor_test::PressKey(dialog, VK_RETURN); break;
-    case Press::Cancel: editor_test::Click(dialog, IDCANCEL); break;
-    case Press::Escape: editor_test::PressKey(dialog, VK_ESCAPE); break;
-    case Press::Help: editor_test::Click(dialog, IDC_SETUP_HELP); break;
-  }
-}
+// A button clicked, or a key pressed in the focused control.
+struct Press {
+  bool key;
+  int code;
+};
+constexpr Press kOk{false, IDOK}, kEnter{true, VK_RETURN}, kCancel{false, IDCANCEL}, kEscape{true, VK_ESCAPE},
+    kHelp{false, IDC_SETUP_HELP};
 
 // The author reads what is shown, then presses each of `presses` in turn;
 // every press but the last leaves the dialog open.
@@ -80,7 +76,8 @@ editor_test::Author ReadThenPress(std::string& shown, std::vector<Press> presses
   return [&shown, presses](HWND dialog) {
     shown = Shown(dialog);
     for (std::size_t i = 0; i < presses.size(); ++i) {
-      Do(dialog, presses[i]);
+      const Press& p = presses[i];
+      p.key ? editor_test::PressKey(dialog, static_cast<WPARAM>(p.code)) : editor_test::Click(dialog, p.code);
       if (i + 1 < presses.size()) {
         EXPECT_TRUE(IsWindowVisible(dialog)) << "press " << i;
       }
@@ -88,26 +85,39 @@ editor_test::Author ReadThenPress(std::string& shown, std::vector<Press> presses
   };
 }
 
-TEST(SetupDialog, NewObjectShowsTheDefaultsAndKeepsThemWhateverEndsIt) {
+// Opened for a new object (command -1) or from the popup menu: every ending
+// keeps the record as shown, and only the setup command opens the dialog.
+TEST(SetupDialog, ShowsTheSettingsAndKeepsThemWhateverEndsIt) {
   const struct {
+    int32_t command;
     std::vector<Press> presses;
+    int shown;
     int32_t result;
-  } endings[] = {{{Press::Cancel}, -1},
-                 {{Press::Escape}, -1},
-                 {{Press::Ok}, 0},
-                 {{Press::Enter}, 0},
-                 {{Press::Help, Press::Help, Press::Enter}, 0},
-                 {{Press::Help, Press::Cancel}, -1}};
-  for (const auto& ending : endings) {
+  } cases[] = {{-1, {kCancel}, 1, -1},  {-1, {kEscape}, 1, -1},
+               {-1, {kOk}, 1, 0},       {-1, {kEnter}, 1, 0},
+               {-1, {kHelp, kHelp, kEnter}, 1, 0},
+               {-1, {kHelp, kCancel}, 1, -1},
+               {2020, {kOk}, 1, 4},     {2020, {kEnter}, 1, 4},
+               {2020, {kCancel}, 1, 0}, {2020, {kEscape}, 1, 0},
+               {2021, {kOk}, 0, 0},     {0, {kOk}, 0, 0}};
+  for (const auto& c : cases) {
+    SCOPED_TRACE(testing::Message() << "command " << c.command << ", " << c.presses.size() << " presses");
     EditorHost host = catalogue_test::HostWithVersion();
-    EditData edit = FreshRecord();
+    EditData edit = c.command < 0 ? FreshRecord() : Defaults();
     std::string shown;
     int32_t result = 99;
-    EXPECT_EQ(WithAuthor(ReadThenPress(shown, ending.presses), [&] { result = CreateObject(&host, nullptr, &edit); }),
-              1);
-    EXPECT_EQ(shown, kDefaultsShown);
-    EXPECT_EQ(result, ending.result) << ending.presses.size() << " presses";
-    EXPECT_TRUE(SameBytes(edit, Defaults())) << ending.presses.size() << " presses";
+    EXPECT_EQ(WithAuthor(ReadThenPress(shown, c.presses),
+                         [&] {
+                           result = c.command < 0 ? CreateObject(&host, nullptr, &edit)
+                                                  : SelectPopup(&host, c.command, nullptr, nullptr, &edit, nullptr,
+                                                                nullptr);
+                         }),
+              c.shown);
+    if (c.shown) {
+      EXPECT_EQ(shown, kDefaultsShown);
+    }
+    EXPECT_EQ(result, c.result);
+    EXPECT_TRUE(SameBytes(edit, Defaults()));
   }
 }
 
@@ -139,38 +149,13 @@ TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   std::memset(edit.linkSpacingText, 'y', kSettingTextSize);
   const EditData before = edit;
   std::string shown;
-  EXPECT_EQ(WithAuthor(ReadThenPress(shown, {Press::Cancel}),
+  EXPECT_EQ(WithAuthor(ReadThenPress(shown, {kCancel}),
                        [&] { result = SelectPopup(&host, 2020, nullptr, nullptr, &edit, nullptr, nullptr); }),
             1);
   EXPECT_EQ(shown, "1001=45 1002=123456789 1003=yyyyyyyyyy 1004=9.81 1005=64 1006=0 1007=32 1008=32 1009=0 "
                    "1010=32 1011=-5 box=1");
   EXPECT_EQ(result, 0);
   EXPECT_TRUE(SameBytes(edit, before));
-}
-
-TEST(SetupDialog, PopupOpensOnlyForItsCommandAndAnswersFourAfterOk) {
-  const struct {
-    int32_t command;
-    Press press;
-    int shown;
-    int32_t result;
-  } cases[] = {{2020, Press::Ok, 1, 4},     {2020, Press::Enter, 1, 4}, {2020, Press::Cancel, 1, 0},
-               {2020, Press::Escape, 1, 0}, {2021, Press::Ok, 0, 0},    {0, Press::Ok, 0, 0}};
-  for (const auto& c : cases) {
-    EditorHost host = catalogue_test::HostWithVersion();
-    EditData edit = Defaults();
-    edit.linkCount = -7;
-    const EditData before = edit;
-    std::string shown;
-    int32_t result = 99;
-    EXPECT_EQ(WithAuthor(ReadThenPress(shown, {c.press}),
-                         [&] { result = SelectPopup(&host, c.command, nullptr, nullptr, &edit, nullptr, nullptr); }),
-              c.shown)
-        << c.command;
-    EXPECT_EQ(result, c.result) << c.command;
-    // OK stores back exactly what was shown.
-    EXPECT_TRUE(SameBytes(edit, before)) << c.command;
-  }
 }
 
 TEST(SetupDialog, IncompatibleHostGetsNoDialogAndNothingWritten) {

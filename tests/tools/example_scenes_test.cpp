@@ -8,11 +8,11 @@
 #include <nlohmann/json.hpp>
 #include <png.h>
 
-#include "player_run.h"
+#include "tool_run.h"
 
 namespace {
 
-using namespace player_test;
+using namespace tool_test;
 using nlohmann::json;
 
 struct GifCloser {
@@ -22,7 +22,7 @@ struct GifCloser {
 TEST(DemoSceneTest, PlaysToTheEndIntoAGifOfEveryFrameEndingOnThePngFrame) {
   Folder folder;
   const json scene = json::parse(RunPlayer({"--print-demo"}, folder).out);
-  const PlayerRun run = RunPlayer({"--png", "last.png", "--trace", "demo.jsonl"}, folder);
+  const ToolRun run = RunPlayer({"--png", "last.png", "--trace", "demo.jsonl"}, folder);
   EXPECT_EQ(run.status, 0);
   EXPECT_EQ(run.err, "");
   EXPECT_EQ(folder.Files(), (std::vector<std::string>{"demo.gif", "demo.jsonl", "last.png"}));
@@ -76,7 +76,7 @@ TEST(DocumentedExampleTest, PlaysAndStopsWhenItsAnchorIsDestroyed) {
   ASSERT_NE(start, std::string::npos);
   Folder folder;
   folder.Write("example.json", doc.substr(start + 8, doc.find("```", start + 8) - start - 8));
-  const PlayerRun run = RunPlayer({"example.json", "--trace", "example.jsonl"}, folder);
+  const ToolRun run = RunPlayer({"example.json", "--trace", "example.jsonl"}, folder);
   ASSERT_EQ(run.status, 0) << run.err;
   EXPECT_EQ(folder.Files(), (std::vector<std::string>{"example.gif", "example.json", "example.jsonl"}));
 

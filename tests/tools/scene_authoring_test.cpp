@@ -5,16 +5,17 @@
 
 #include <nlohmann/json.hpp>
 
-#include "player_run.h"
+#include "tool_run.h"
 
 namespace {
 
-using namespace player_test;
+using namespace tool_test;
 using nlohmann::json;
 
 // One swinging chain of two links, a rider carried by a rule that the
-// timeline switches off at frame 3 and on again at frame 6, and `extra`
-// timeline entries.
+// timeline switches off at frame 3 and on again at frame 6 (the rule may name
+// the rider, which the timeline destroys at frame 11), and `extra` timeline
+// entries.
 std::string Scene(const std::string& extra) {
   return R"({"frames": 12, "canvas": {"width": 200, "height": 120},
   "objects": [
@@ -29,7 +30,7 @@ std::string Scene(const std::string& extra) {
       {"action": "Add Link", "params": ["link2"]}, {"action": "Add Platform", "params": ["platform"]},
       {"action": "Start All"}]},
     {"frame": 3, "do": [{"disable": "carry"}]},
-    {"frame": 6, "do": [{"enable": "carry"}]})" +
+    {"frame": 6, "do": [{"enable": "carry"}]}, {"frame": 11, "do": [{"destroy": "rider"}]})" +
          extra + R"(],
   "onSwing": [{"name": "carry", "chain": 0, "do": [{"move": "rider", "by": [1, 0]}]}]})";
 }
@@ -37,7 +38,7 @@ std::string Scene(const std::string& extra) {
 TEST(SceneAuthoringTest, SeveralPngFramesOfOneRunMatchTheSameFramesOfSeparateRuns) {
   Folder folder;
   folder.Write("scene.json", Scene(""));
-  const PlayerRun run = RunPlayer({"scene.json", "--frames", "9", "--png", "f%02d.png", "--png-frame", "2,4-8/4",
+  const ToolRun run = RunPlayer({"scene.json", "--frames", "9", "--png", "f%02d.png", "--png-frame", "2,4-8/4",
                                    "--png", "last.png"},
                                   folder);
   ASSERT_EQ(run.status, 0) << run.err;
@@ -69,7 +70,7 @@ TEST(SceneAuthoringTest, RepeatingEntryPlaysAsTheSameStepsWrittenFrameByFrame) {
   // The rider moves one pixel a swing, but not while the rule is off (frames 3 to 5).
   const std::vector<std::string> lines = Lines(trace);
   ASSERT_EQ(lines.size(), 12u);
-  for (const auto& [frame, x] : {std::pair{2, 3}, {5, 3}, {11, 9}}) {
+  for (const auto& [frame, x] : {std::pair{2, 3}, {5, 3}, {10, 8}}) {
     EXPECT_EQ(json::parse(lines[frame])["objects"][4]["x"], x) << "frame " << frame;
   }
 }
@@ -85,7 +86,7 @@ TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
       {"action": "Add Link", "params": ["l1"]}, {"action": "Add Link", "params": ["l2"]},
       {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"}]},
       {"frame": 2, "do": [{"action": "Set Angle", "params": [1, 1e39]}]}]})");
-  const PlayerRun run = RunPlayer({"scene.json"}, folder);
+  const ToolRun run = RunPlayer({"scene.json"}, folder);
   EXPECT_EQ(run.status, 0);
   const std::vector<std::string> expected = {
       "scene.json: settings.gravity: warning: the text \"9.8x\" is not a number; the library reads the number it "

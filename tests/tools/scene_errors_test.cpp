@@ -6,11 +6,11 @@
 #include <string>
 #include <vector>
 
-#include "player_run.h"
+#include "tool_run.h"
 
 namespace {
 
-using namespace player_test;
+using namespace tool_test;
 
 struct BadInput {
   const char* name;
@@ -34,8 +34,8 @@ std::string Do(const std::string& actions) { return Scene(R"([{"frame": 0, "do":
 std::string ManyColours() {
   std::string objects;
   for (int i = 0; i < 257; ++i) {
-    objects += (i ? R"(,{"name": "o)" : R"({"name": "o)") + std::to_string(i) +
-               R"(", "x": 0, "y": 0, "width": 1, "height": 1, "colour": "#0)" + std::to_string(10000 + i) + "\"}";
+    objects += (i ? ",{" : "{") + std::string(R"("name": "o)") + std::to_string(i) + R"(", "x": 0, "y": 0, "width": 1, )" +
+               R"("height": 1, "colour": "#0)" + std::to_string(10000 + i) + "\"}";
   }
   return R"({"frames": 1, "objects": [)" + objects + "]}";
 }
@@ -60,8 +60,6 @@ const BadInput kBadInputs[] = {
      "expected an integer, a whole number from -2147483648 to 2147483647, found 0.5"},
     {"NumberForObject", Do(R"({"action": "Add Anchor", "params": [3]})"), "timeline[0].do[0].params[0]",
      "expected an object's name, found 3"},
-    {"NegativeFrameCount", R"({"frames": -5})", "frames",
-     "expected the number of frames to play, a whole number from 1 to 100000, found -5"},
     {"FrameAfterTheLast", Scene(R"([{"frame": 10, "do": []}])"), "timeline[0].frame", "from 0 to 9, found 10"},
     {"UnknownKey", Scene("[]", R"(, "onswing": [])"), "top level", "unknown key \"onswing\"; expected one of"},
     {"UnknownExpression", Do(R"({"move": "link", "by": [{"expression": "DeltaZ(", "params": [0]}, 0]})"),
@@ -79,10 +77,6 @@ const BadInput kBadInputs[] = {
     {"PngFrameOutsideTheScene", R"({"frames": 3})", "scene_player: --png-frame 3: expected a frame from 0 to 2", "",
      {"scene.json", "--png", "x.png", "--png-frame", "3"}},
     {"NumberBeyondADouble", "{\"frames\": 1e400}", "line 1, column 12", "the number 1e400 is out of range"},
-    {"NegativeNumberBeyondADoubleInAStep", Do(R"({"action": "Set Angle", "params": [0, -1e400]})"), "line 3, column 140",
-     "the number -1e400 is out of range"},
-    {"IntegerBeyondEveryInteger", Scene("[]", R"(, "canvas": {"width": 99999999999999999999})"), "canvas.width",
-     "from 1 to 4096, found 1e+20"},
     {"RepeatingEntryCreates", Scene(R"([{"every": 2, "from": 0, "do": [{"create": {"name": "x"}}]}])"),
      "timeline[0].do[0]", "a repeating entry runs many times, so it cannot create an object"},
     {"RepetitionCountedOutsideARepeatingEntry", Do(R"({"move": "link", "by": [{"count": "repetition"}, 0]})"),
@@ -90,8 +84,6 @@ const BadInput kBadInputs[] = {
     {"FrameAndEveryInOneEntry", Scene(R"([{"frame": 1, "every": 2, "do": []}])"), "timeline[0]",
      "expected either \"frame\" for steps that run once, or \"every\""},
     {"RuleNamedNowhere", Do(R"({"disable": "carry"})"), "timeline[0].do[0].disable", "no rule named \"carry\""},
-    {"TwoPngsOnOneFile", R"({"frames": 3})", "scene_player: --png ./a.png: also written by --png a.png", "",
-     {"scene.json", "--png", "a.png", "--png", "./a.png"}},
     {"SeveralFramesForOneName", R"({"frames": 3})", "scene_player: --png a.png: 2 frames for one file name", "",
      {"scene.json", "--png", "a.png", "--png-frame", "0,2"}},
     {"MoreFramesThanTheScene", R"({"frames": 3})", "scene_player: --frames 4: expected at most", "",
@@ -107,7 +99,7 @@ TEST_P(BadInputTest, SaysWhereAndWhatInOneLineAndLeavesNoFile) {
   const BadInput& bad = GetParam();
   Folder folder;
   if (!bad.scene.empty()) folder.Write("scene.json", bad.scene);
-  const PlayerRun run = RunPlayer(bad.args, folder);
+  const ToolRun run = RunPlayer(bad.args, folder);
 
   EXPECT_EQ(run.status, bad.status);
   const std::vector<std::string> lines = Lines(run.err);

@@ -1,5 +1,5 @@
-// Runs the scene player as a program, in a folder of its own, and keeps what
-// it printed and the status it ended with.
+// Runs a tool (the scene player, the editor preview) as a program, in a
+// folder of its own, and keeps what it printed and the status it ended with.
 #pragma once
 
 #include <sys/wait.h>
@@ -13,7 +13,7 @@
 #include <string>
 #include <vector>
 
-namespace player_test {
+namespace tool_test {
 
 inline std::string ReadFile(const std::string& path) {
   std::ifstream file(path, std::ios::binary);
@@ -33,7 +33,7 @@ inline std::vector<std::string> Lines(const std::string& text) {
 class Folder {
  public:
   Folder() {
-    std::string pattern = (std::filesystem::temp_directory_path() / "scene_player_test.XXXXXX").string();
+    std::string pattern = (std::filesystem::temp_directory_path() / "tool_test.XXXXXX").string();
     if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("cannot make a temporary folder");
     path_ = pattern;
   }
@@ -61,26 +61,32 @@ class Folder {
   std::string path_;
 };
 
-struct PlayerRun {
+struct ToolRun {
   int status = -1;  // exit status; -1 when it did not exit normally
   std::string out;  // standard output
   std::string err;  // standard error
 };
 
-// Runs the player with `args` in `folder`. What it prints goes to a folder of
+// Runs `program` with `args` in `folder`. What it prints goes to a folder of
 // its own, so that the files it leaves in `folder` are only its own.
-inline PlayerRun RunPlayer(const std::vector<std::string>& args, const Folder& folder) {
+inline ToolRun RunTool(const std::string& program, const std::vector<std::string>& args, const Folder& folder) {
   const auto quoted = [](const std::string& word) { return "'" + word + "'"; };
   Folder captured;
-  std::string command = "cd " + quoted(folder.path()) + " && exec " + quoted(SCENE_PLAYER);
+  std::string command = "cd " + quoted(folder.path()) + " && exec " + quoted(program);
   for (const std::string& arg : args) command += " " + quoted(arg);
   command += " >" + quoted(captured / "out") + " 2>" + quoted(captured / "err");
   const int status = std::system(command.c_str());
-  PlayerRun run;
+  ToolRun run;
   if (status != -1 && WIFEXITED(status)) run.status = WEXITSTATUS(status);
   run.out = ReadFile(captured / "out");
   run.err = ReadFile(captured / "err");
   return run;
 }
 
-}  // namespace player_test
+#ifdef SCENE_PLAYER
+inline ToolRun RunPlayer(const std::vector<std::string>& args, const Folder& folder) {
+  return RunTool(SCENE_PLAYER, args, folder);
+}
+#endif
+
+}  // namespace tool_test
