@@ -86,6 +86,10 @@ INT_PTR CALLBACK SetupDialogProc(HWND dialog, UINT message, WPARAM wParam, LPARA
 INT_PTR RunSetupDialog(EditorHost* host, EditData* edit) noexcept {
   SetupDialogContext context{edit, host};
   const auto owner = static_cast<HWND>(host->slot[kEditorSlotOwnerWindow]);
+  // USER32 answers 0, the result of OK, when the owner is not a window: the
+  // caller would take a dialog never shown for settings confirmed. That
+  // failure is reported as -1, as every other failure to show the dialog is.
+  if (owner != nullptr && !IsWindow(owner)) return -1;
   return DialogBoxParamA(TavrinModule(), MAKEINTRESOURCEA(IDD_SETUP), owner, SetupDialogProc,
                          reinterpret_cast<LPARAM>(&context));
 }

@@ -17,6 +17,5 @@ struct SetupDialogContext {
 INT_PTR CALLBACK SetupDialogProc(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) noexcept;
 
 // Shows the dialog over `edit`, owned by the host's owner window, and waits
-// for it: 0 after OK, -1 after Cancel, or what DialogBoxParamA answers when
-// it cannot show the dialog.
+// for it: 0 after OK, -1 after Cancel or when the dialog cannot be shown.
 INT_PTR RunSetupDialog(EditorHost* host, EditData* edit) noexcept;

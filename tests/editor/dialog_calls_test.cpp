@@ -94,6 +94,11 @@ TEST(DialogCalls, DialogThatCannotBeShownAnswersAsUser32Does) {
     // An owner that is not a window: no dialog, and 0.
     const auto stale = reinterpret_cast<HWND>(static_cast<uintptr_t>(0x7FFF0));
     EXPECT_EQ(DialogBoxParamA(TavrinModule(), MAKEINTRESOURCEA(IDD_SETUP), stale, SetupDialogProc, param), 0);
+    // The routines do not take that 0 for OK: nothing shown, nothing stored.
+    EditorHost host = catalogue_test::HostWithVersion();
+    host.slot[kEditorSlotOwnerWindow] = stale;
+    EXPECT_EQ(CreateObject(&host, nullptr, &edit), -1);
+    EXPECT_EQ(SelectPopup(&host, 2020, nullptr, nullptr, &edit, nullptr, nullptr), 0);
   });
   EXPECT_EQ(shown, 0);
 }
