@@ -13,8 +13,8 @@
 #include <vector>
 
 #include "frame/exports.h"
-#include "fuzz_input.h"
 #include "frame/host_services.h"
+#include "fuzz_input.h"
 #include "standin_win32.h"
 
 namespace {
@@ -34,7 +34,6 @@ class Input : public FuzzInput {
     return b < 224 ? first + b % 20 - 2 : Int();
   }
 };
-
 
 constexpr uint8_t kSentinel = 0xCD;
 constexpr size_t kGuard = 32;
