@@ -117,8 +117,9 @@ TEST(EventMenus, ListItemsThenSubmenusWithTheirIdsInOrder) {
 // buffers as they were.
 TEST(EventMenus, IncompatibleHostGetsNoMenusAndNoDisplayStrings) {
   const std::pair<const char*, uint32_t> hosts[] = {
-      {"no version service", 0}, {"build 217", 0x02000000u | 217u}, {"build 100 with bit 0x1000", 0x02000000u | 0x1000u | 100u},
-      {"version 0x0100", 0x01000000u | 300u}, {"flag 0x8000 set", 0x02000000u | 0x8000u | 300u}};
+      {"no version service", 0}, {"build 217", 0x02000000u | 217u},
+      {"build 100 with bit 0x1000", 0x02000000u | 0x1000u | 100u}, {"version 0x0100", 0x01000000u | 300u},
+      {"flag 0x8000 set", 0x02000000u | 0x8000u | 300u}};
   for (const auto& [why, version] : hosts) {
     EditorHost host = version != 0 ? HostWithVersion(version) : EditorHost{};
     for (auto menu : {GetConditionMenu, GetActionMenu, GetExpressionMenu}) {
