@@ -74,25 +74,6 @@ TEST(SwingStep, ChainLengthComesFromTheFirstLinkAndLinksUseTheirOwnHeights) {
   }
 }
 
-// Three links per chain, the seventh in none; the second chain has no
-// platform but steps and raises its event all the same.
-TEST(SwingStep, SevenLinksAndOnePlatformForTwoChains) {
-  ChainScene scene;
-  scene.Anchor(100, 0, 1);
-  scene.Anchor(300, 0, 1);
-  HostObject* links[7];
-  for (HostObject*& link : links) link = scene.Link(10);
-  HostObject* platform = scene.Platform();
-  scene.host.RunFrame();
-  for (int i = 0; i < 3; ++i) EXPECT_LT(links[i]->head.x, 100) << i;  // swung out from x 100
-  for (int i = 3; i < 6; ++i) EXPECT_GT(links[i]->head.x, 200) << i;  // chain 1, about x 300
-  EXPECT_EQ(links[6]->changed, 0);
-  EXPECT_EQ(platform->head.x, 60);  // chain 0's, 40 left of its anchor
-  EXPECT_NEAR(scene.Chain(1).platformX, 260.0f, 1e-2f);
-  EXPECT_EQ(scene.host.eventsRaised, 2);
-  EXPECT_EQ(scene.rd.currentChain, 1);
-}
-
 // Three chains; objects destroyed before the frame, or during it by an "On
 // Swing" rule of chain 1, which may hand one to the chains again at once or
 // anchor a new chain. The host frees destroyed objects as soon as that
