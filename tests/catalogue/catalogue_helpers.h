@@ -26,22 +26,30 @@ inline EditorHost HostWithVersion(uint32_t version = 0x02000000u | 218u) {
   return host;
 }
 
-// A text buffer of `size` bytes filled with a sentinel, so that any byte
-// written shows. Whether a routine stays inside its buffer is the fuzzers' job.
-class TextBuffer {
+// A text buffer of `size` bytes with guard bytes on both sides, all filled
+// with a sentinel so that any byte written shows.
+class GuardedBuffer {
  public:
-  explicit TextBuffer(std::size_t size) : bytes_(size, '\xCD') {}
-  char* data() { return bytes_.data(); }
-  int16_t size() const { return static_cast<int16_t>(bytes_.size()); }
+  static constexpr char kSentinel = '\xCD';
+  static constexpr std::size_t kGuard = 16;
+
+  explicit GuardedBuffer(std::size_t size) : size_(size), bytes_(kGuard + size + kGuard, kSentinel) {}
+  char* data() { return bytes_.data() + kGuard; }
+  int16_t size() const { return static_cast<int16_t>(size_); }
+  bool guardsIntact() const {
+    return bytes_.find_first_not_of(kSentinel) >= kGuard && bytes_.find_last_not_of(kSentinel) + 1 <= kGuard + size_;
+  }
   // The text up to its terminator, "<no terminator>" when none lies inside,
   // or "<untouched>" when no byte was written.
   std::string text() const {
-    if (bytes_.find_first_not_of('\xCD') == std::string::npos) return "<untouched>";
-    const std::size_t end = bytes_.find('\0');
-    return end == std::string::npos ? "<no terminator>" : bytes_.substr(0, end);
+    if (bytes_.find_first_not_of(kSentinel) == std::string::npos) return "<untouched>";
+    const std::string inside = bytes_.substr(kGuard, size_);
+    const std::size_t end = inside.find('\0');
+    return end == std::string::npos ? "<no terminator>" : inside.substr(0, end);
   }
 
  private:
+  std::size_t size_;
   std::string bytes_;
 };
 

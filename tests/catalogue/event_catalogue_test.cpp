@@ -15,7 +15,7 @@
 namespace {
 
 using catalogue_test::HostWithVersion;
-using catalogue_test::TextBuffer;
+using catalogue_test::GuardedBuffer;
 
 // The words of an entry from its code word on: code, flags, count, types, titles.
 std::vector<uint16_t> EntryWords(const void* infos) {
@@ -47,7 +47,7 @@ enum class Routine { ConditionString, ActionString, ExpressionString, ConditionT
 // What `routine` writes for `code` and `param` into a buffer of `size` bytes.
 std::string TextOf(Routine routine, int32_t code, int16_t param, int16_t size = 128,
                    EditorHost host = HostWithVersion()) {
-  TextBuffer buffer(size);
+  GuardedBuffer buffer(size);
   char* b = buffer.data();
   switch (routine) {
     case Routine::ConditionString: GetConditionString(&host, code, b, size); break;

@@ -10,7 +10,7 @@
 
 namespace {
 
-using catalogue_test::TextBuffer;
+using catalogue_test::GuardedBuffer;
 
 class StandinFaults : public ::testing::Test {
  protected:
@@ -46,7 +46,7 @@ TEST_F(StandinFaults, MenuIsNullWhenAnyScratchBufferOrPopupIsMissingAndLeavesNot
       c.fail(0, 0);
     }
   }
-  TextBuffer buffer(32);
+  GuardedBuffer buffer(32);
   GetExpressionTitle(nullptr, 3, buffer.data(), buffer.size());  // loads and drops the menu
   EXPECT_EQ(buffer.text(), "Get Anchor Y");
   EXPECT_TRUE(NothingLeftBehind());
@@ -54,7 +54,7 @@ TEST_F(StandinFaults, MenuIsNullWhenAnyScratchBufferOrPopupIsMissingAndLeavesNot
 
 TEST_F(StandinFaults, ForeignModuleOrBlockIsAnError) {
   static char elsewhere;
-  TextBuffer text(16);
+  GuardedBuffer text(16);
   EXPECT_EQ(LoadStringA(reinterpret_cast<HINSTANCE>(&elsewhere), IDS_OBJECT_NAME, text.data(), text.size()), 0);
   EXPECT_EQ(text.text(), "");
   EXPECT_EQ(LoadMenuA(reinterpret_cast<HINSTANCE>(&elsewhere), MAKEINTRESOURCEA(IDM_ACTIONS)), nullptr);

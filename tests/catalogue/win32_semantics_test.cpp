@@ -11,7 +11,7 @@
 
 namespace {
 
-using catalogue_test::TextBuffer;
+using catalogue_test::GuardedBuffer;
 
 // A short buffer gets size - 1 characters and a terminator.
 TEST(Win32Strings, StringTableHoldsTheObjectTextsCutToTheBuffer) {
@@ -26,7 +26,7 @@ TEST(Win32Strings, StringTableHoldsTheObjectTextsCutToTheBuffer) {
                  // Absent: a hole in a block that exists, and a block that does not.
                  {IDS_OBJECT_COMMENT, 256, ""}, {3, 256, ""}, {5000, 256, ""}};
   for (const auto& s : strings) {
-    TextBuffer buffer(s.size);
+    GuardedBuffer buffer(s.size);
     const int length = LoadStringA(TavrinModule(), s.id, buffer.data(), buffer.size());
     EXPECT_EQ(static_cast<std::size_t>(length), buffer.text().size()) << s.id;
     EXPECT_TRUE(s.text ? buffer.text() == s.text : !buffer.text().empty()) << s.id << ": " << buffer.text();
