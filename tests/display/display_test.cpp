@@ -66,7 +66,8 @@ TEST(EditorDisplay, ShowsThePictureOrNothingAsTheSettingsSay) {
     int16_t width, height;
     LONG right;
   } cases[] = {{"view template 0", true, 0, picture, 32, 32, 142},
-               {"no editor surface", false, 1, {"GetEditorSurface null 0"}, 70, 50, 12345}};
+               {"no editor surface", false, 1, {"GetEditorSurface null 0"}, 70, 50, 12345},
+               {"view template 2", true, 2, {"GetEditorSurface window 0"}, 70, 50, 180}};
   for (const auto& c : cases) {
     SCOPED_TRACE(c.name);
     EditData edit = Defaults(c.viewTemplate);
@@ -111,8 +112,12 @@ TEST(EditorDisplay, TemplateSettingsSetTheRadiusAndTheSwing) {
     std::vector<std::string> labels;  // the anchor's, then the three platforms'
   };
   const Case cases[] = {
+      {"30", "0", 10, 768, 736, {"(368,352)", "(560,672)", "(384,719)", "(208,672)"}},
+      {"0", "0", 10, 768, 736, {"(368,352)", "(384,719)", "(384,719)", "(384,719)"}},
       {"45.9", "0", 10, 768, 736, {"(368,352)", "(632,616)", "(384,719)", "(135,616)"}},
+      {"-30.7", "0", 10, 768, 736, {"(368,352)", "(208,672)", "(384,719)", "(560,672)"}},
       {"90", "2.9", 10, 812, 780, {"(390,374)", "(780,390)", "(406,763)", "(32,390)"}},
+      {"90", "0", 0, 128, 96, {"(48,32)", "(96,48)", "(64,79)", "(32,48)"}},
       // Not a number: no swing and no spacing.
       {"abc", "x", 10, 768, 736, {"(368,352)", "(384,719)", "(384,719)", "(384,719)"}},
   };
