@@ -28,4 +28,4 @@ llvm-profdata-14 merge -sparse "$out"/*.profraw -o "$out/all.profdata"
 others=()
 for binary in "${binaries[@]:1}"; do others+=(-object "$binary"); done
 llvm-cov-14 report -instr-profile="$out/all.profdata" "${binaries[0]}" "${others[@]}" \
-  -ignore-filename-regex='/(standin|fuzz|tests|usr)/|_res\.cpp$' 
+  -ignore-filename-regex='/(standin|fuzz|tests|usr)/|_res\.cpp$'
