@@ -2,11 +2,7 @@
 
 #include <cmath>
 
-namespace {
-
-constexpr double kDegree = 0.017453277777777776;  // 3.14159 / 180, as the chains use it
-
-}  // namespace
+#include "chains/float_math.h"
 
 LimitChains LimitChainsOf(const RunData& rd) {
   LimitChains limit;

@@ -1,6 +1,7 @@
 // Editor routines that only size the object or do nothing at all.
 #include <cstring>
 
+#include "editor/wrapping_arithmetic.h"
 #include "frame/edit_data.h"
 #include "frame/exports.h"
 
@@ -20,19 +21,10 @@ TAVRIN_EXPORT void TVCALL CreateFromFile(void*, void*, EditData* edit) {
   edit->objectHeight = 32;
 }
 
-namespace {
-
-// a + b as 32-bit arithmetic gives it, wrapping at the integer limits.
-LONG WrappingSum(LONG a, int16_t b) {
-  return static_cast<LONG>(static_cast<uint32_t>(a) + static_cast<uint32_t>(int32_t{b}));
-}
-
-}  // namespace
-
 TAVRIN_EXPORT void TVCALL GetObjectRect(EditorHost*, RECT* rect, void*, EditData* edit) {
   // The sizes are signed 16-bit: a stored 65535 is -1.
-  rect->right = WrappingSum(rect->left, edit->objectWidth);
-  rect->bottom = WrappingSum(rect->top, edit->objectHeight);
+  rect->right = WrapAdd(rect->left, edit->objectWidth);
+  rect->bottom = WrapAdd(rect->top, edit->objectHeight);
 }
 
 TAVRIN_EXPORT int32_t TVCALL IsTransparent(void*, void*, void*, int32_t, int32_t) { return 0; }

@@ -5,6 +5,7 @@
 
 #include "chains/float_math.h"
 #include "editor/drawing_services.h"
+#include "editor/wrapping_arithmetic.h"
 #include "frame/edit_data.h"
 #include "frame/exports.h"
 #include "frame/host_services.h"
@@ -14,12 +15,8 @@
 
 namespace {
 
-// A stored record may hold any 32-bit sizes. The host works them out in
-// 32-bit registers, where sums and products wrap; unsigned arithmetic gives
-// the same bits without signed overflow.
-int32_t Add(int32_t a, int32_t b) { return static_cast<int32_t>(static_cast<uint32_t>(a) + static_cast<uint32_t>(b)); }
-int32_t Sub(int32_t a, int32_t b) { return static_cast<int32_t>(static_cast<uint32_t>(a) - static_cast<uint32_t>(b)); }
-int32_t Mul(int32_t a, int32_t b) { return static_cast<int32_t>(static_cast<uint32_t>(a) * static_cast<uint32_t>(b)); }
+// A stored record may hold any 32-bit sizes, which the host works out with
+// wrapping arithmetic (editor/wrapping_arithmetic.h).
 int32_t Half(int32_t value) { return value / 2; }  // toward zero; never overflows
 
 // A setting text read as the run-time object reads it, truncated toward zero.
@@ -31,15 +28,6 @@ int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
 // cx + R cos(angle) or cy + R sin(angle), saturated as above when R is huge.
 int32_t OnArc(int32_t centre, int32_t radius, double trig) {
   return TruncateToInt(static_cast<double>(radius) * trig + static_cast<double>(centre), 0);
-}
-
-RECT MakeRect(int32_t left, int32_t top, int32_t right, int32_t bottom) {
-  RECT rect{};
-  rect.left = left;
-  rect.top = top;
-  rect.right = right;
-  rect.bottom = bottom;
-  return rect;
 }
 
 void DrawRectangle(HostSurface* surface, int32_t x1, int32_t y1, int32_t x2, int32_t y2) {
@@ -72,30 +60,31 @@ void DrawPicture(HostSurface* editor, int32_t left, int32_t top) {
 void DrawTemplate(HostSurface* editor, const EditData& edit, const RECT& rect, int32_t radius, int32_t angle) {
   const auto left = static_cast<int32_t>(rect.left);
   const auto top = static_cast<int32_t>(rect.top);
-  const int32_t cx = Add(left, Half(Sub(static_cast<int32_t>(rect.right), left)));
-  const int32_t cy = Add(top, Half(Sub(static_cast<int32_t>(rect.bottom), top)));
+  const int32_t cx = WrapAdd(left, Half(WrapSub(static_cast<int32_t>(rect.right), left)));
+  const int32_t cy = WrapAdd(top, Half(WrapSub(static_cast<int32_t>(rect.bottom), top)));
 
-  const int32_t anchorLeft = Sub(cx, Half(edit.anchorWidth));
-  const int32_t anchorTop = Sub(cy, Half(edit.anchorHeight));
-  DrawRectangle(editor, anchorLeft, anchorTop, Add(cx, Half(edit.anchorWidth)), Add(cy, Half(edit.anchorHeight)));
+  const int32_t anchorLeft = WrapSub(cx, Half(edit.anchorWidth));
+  const int32_t anchorTop = WrapSub(cy, Half(edit.anchorHeight));
+  DrawRectangle(editor, anchorLeft, anchorTop, WrapAdd(cx, Half(edit.anchorWidth)),
+                WrapAdd(cy, Half(edit.anchorHeight)));
   // The anchor's label shows its top-left corner and starts there.
   DrawLabel(editor, anchorLeft, anchorTop,
-            MakeRect(anchorLeft, anchorTop, Add(anchorLeft, Mul(2, edit.anchorWidth)),
-                     Add(anchorTop, Mul(2, edit.anchorHeight))));
+            RECT{anchorLeft, anchorTop, WrapAdd(anchorLeft, WrapMul(2, edit.anchorWidth)),
+                 WrapAdd(anchorTop, WrapMul(2, edit.anchorHeight))});
 
-  int32_t theta = Sub(90, angle);
-  for (int i = 0; i < 3; ++i, theta = Add(theta, angle)) {
+  int32_t theta = WrapSub(90, angle);
+  for (int i = 0; i < 3; ++i, theta = WrapAdd(theta, angle)) {
     const double radians = static_cast<double>(theta) * kDegree;
     const int32_t px = OnArc(cx, radius, std::cos(radians));
     const int32_t py = OnArc(cy, radius, std::sin(radians));
-    const int32_t platformTop = Sub(py, Half(edit.platformHeight));
-    DrawRectangle(editor, Sub(px, Half(edit.platformWidth)), platformTop, Add(px, Half(edit.platformWidth)),
-                  Add(py, Half(edit.platformHeight)));
+    const int32_t platformTop = WrapSub(py, Half(edit.platformHeight));
+    DrawRectangle(editor, WrapSub(px, Half(edit.platformWidth)), platformTop, WrapAdd(px, Half(edit.platformWidth)),
+                  WrapAdd(py, Half(edit.platformHeight)));
     // A platform's label shows its centre, in a rectangle centred on px and
     // twice the platform's width wide.
     DrawLabel(editor, px, py,
-              MakeRect(Sub(px, edit.platformWidth), platformTop, Add(px, edit.platformWidth),
-                       Add(platformTop, Mul(2, edit.platformHeight))));
+              RECT{WrapSub(px, edit.platformWidth), platformTop, WrapAdd(px, edit.platformWidth),
+                   WrapAdd(platformTop, WrapMul(2, edit.platformHeight))});
   }
 }
 
@@ -109,12 +98,12 @@ TAVRIN_EXPORT void TVCALL EditorDisplay(EditorHost* host, void*, void* placed, E
   const int32_t spacing = SettingInteger(edit->linkSpacingText);
   const int32_t angle = SettingInteger(edit->startAngleText);
   // Each link adds its height and the spacing; there is one step more than links.
-  const int32_t radius = Mul(Add(edit->linkHeight, spacing), Add(edit->linkCount, 1));
+  const int32_t radius = WrapMul(WrapAdd(edit->linkHeight, spacing), WrapAdd(edit->linkCount, 1));
 
   // The sizes are 16-bit fields and keep the low 16 bits.
   if (edit->viewTemplate == 1) {
-    edit->objectWidth = static_cast<int16_t>(Add(edit->platformWidth, Mul(2, radius)));
-    edit->objectHeight = static_cast<int16_t>(Add(edit->platformHeight, Mul(2, radius)));
+    edit->objectWidth = static_cast<int16_t>(WrapAdd(edit->platformWidth, WrapMul(2, radius)));
+    edit->objectHeight = static_cast<int16_t>(WrapAdd(edit->platformHeight, WrapMul(2, radius)));
   } else if (edit->viewTemplate == 0) {
     edit->objectWidth = 32;
     edit->objectHeight = 32;
