@@ -118,11 +118,6 @@ HWND NewWindow(Window window) {
   return reinterpret_cast<HWND>(handle);
 }
 
-void DeleteWindow(HWND handle) {
-  if (g_focus == handle) g_focus = nullptr;
-  Windows().erase(reinterpret_cast<uintptr_t>(handle));
-}
-
 Window* FindWindowOf(HWND handle) {
   const auto found = Windows().find(reinterpret_cast<uintptr_t>(handle));
   return found == Windows().end() ? nullptr : &found->second;
