@@ -39,14 +39,17 @@ std::string WindowName(const void* window) {
   return window == g_window ? "window" : "unknown";
 }
 
+bool IsEditor(const HostSurface* surface) { return g_window != nullptr && surface == &g_window->surface; }
+bool IsScratch(const HostSurface* surface) { return g_scratch.count(surface) != 0; }
+
 std::string SurfaceName(const HostSurface* surface) {
-  if (g_window != nullptr && surface == &g_window->surface) return "editor";
-  return g_scratch.count(surface) != 0 ? "scratch" : "invalid";
+  if (IsEditor(surface)) return "editor";
+  return IsScratch(surface) ? "scratch" : "invalid";
 }
 
 // The canvas of a surface that may be drawn on, or null.
 dravo2::Canvas* CanvasOf(const HostSurface* surface) {
-  return SurfaceName(surface) == "invalid" ? nullptr : surface->canvas;
+  return IsEditor(surface) || IsScratch(surface) ? surface->canvas : nullptr;
 }
 
 std::string Numbers(std::initializer_list<long long> values) {
@@ -139,7 +142,7 @@ DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceDestruct(HostSurface* self) {
 
 DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceCreate(HostSurface* self, int32_t width, int32_t height, HostSurface* model) {
   Record("Create " + SurfaceName(self) + Numbers({width, height}) + " " + SurfaceName(model));
-  if (SurfaceName(self) != "scratch") return;
+  if (!IsScratch(self)) return;
   const bool fits = width >= 1 && width <= kLargestSide && height >= 1 && height <= kLargestSide;
   ReplaceCanvas(self, fits ? dravo2::CanvasCreate(width, height, false) : nullptr);
 }
@@ -150,7 +153,7 @@ DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceLoadBitmap(HostSurface* self, HINS
   std::string result = " -> failed";
   if (found) result = " -> " + std::to_string(bitmap.width) + "x" + std::to_string(bitmap.height);
   Record("LoadBitmap " + SurfaceName(self) + Numbers({bitmapId, ownSize}) + result);
-  if (!found || SurfaceName(self) != "scratch") return;
+  if (!found || !IsScratch(self)) return;
   dravo2::Canvas* loaded = dravo2::CanvasFromBitmap(bitmap.width, bitmap.height, bitmap.palette,
                                                     bitmap.paletteSize, bitmap.pixels, (bitmap.width + 3) & ~3);
   if (ownSize == 1 || self->canvas == nullptr) {

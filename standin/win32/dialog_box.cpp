@@ -89,11 +89,12 @@ HWND CreateDialogWindows(const DialogTemplate& dialogTemplate, HWND owner, DLGPR
       control.id = item.id;
       control.style = item.style;
       control.text = item.title.isOrdinal ? std::string() : item.title.text;
+      const bool isDefault = control.kind == WindowKind::DefPushButton;
       const HWND controlHandle = NewWindow(std::move(control));
       Window* window = FindWindowOf(handle);
       window->controls.push_back(controlHandle);
       // The last default push button made is the dialog's default.
-      if (FindWindowOf(controlHandle)->kind == WindowKind::DefPushButton) window->defaultId = item.id;
+      if (isDefault) window->defaultId = item.id;
     }
   } catch (const std::bad_alloc&) {
     if (handle != nullptr) DestroyDialog(handle);
@@ -116,11 +117,6 @@ HWND NewWindow(Window window) {
   const uintptr_t handle = g_nextHandle++;
   Windows().emplace(handle, std::move(window));
   return reinterpret_cast<HWND>(handle);
-}
-
-void DeleteWindow(HWND handle) {
-  if (g_focus == handle) g_focus = nullptr;
-  Windows().erase(reinterpret_cast<uintptr_t>(handle));
 }
 
 Window* FindWindowOf(HWND handle) {

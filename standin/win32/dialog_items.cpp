@@ -55,16 +55,13 @@ LRESULT TextMessage(Window& window, UINT Msg, WPARAM wParam, LPARAM lParam) {
 
 LRESULT DialogMessage(HWND hWnd, const Window& window, UINT Msg, WPARAM wParam, LPARAM lParam) {
   // The dialog procedure first; what it leaves, the dialog's own handling.
-  if (window.proc != nullptr && window.proc(hWnd, Msg, wParam, lParam) != 0) {
-    const Window* after = FindWindowOf(hWnd);
-    return after == nullptr ? 0 : after->msgResult;
-  }
-  if (Msg == DM_GETDEFID) {
-    const Window* after = FindWindowOf(hWnd);
-    return after == nullptr || after->defaultId == 0 ? 0 : MAKELONG(after->defaultId, DC_HASDEFID);
-  }
+  // The window may be gone when the procedure returns: it is looked up again.
+  const bool handled = window.proc != nullptr && window.proc(hWnd, Msg, wParam, lParam) != 0;
   Window* after = FindWindowOf(hWnd);
-  return after == nullptr ? 0 : TextMessage(*after, Msg, wParam, lParam);
+  if (after == nullptr) return 0;
+  if (handled) return after->msgResult;
+  if (Msg == DM_GETDEFID) return after->defaultId == 0 ? 0 : MAKELONG(after->defaultId, DC_HASDEFID);
+  return TextMessage(*after, Msg, wParam, lParam);
 }
 
 LRESULT ControlMessage(HWND hWnd, Window& window, UINT Msg, WPARAM wParam, LPARAM lParam) {

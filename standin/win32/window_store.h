@@ -33,7 +33,6 @@ struct Window {
 
 // A new window; its handle.
 HWND NewWindow(Window window);
-void DeleteWindow(HWND handle);
 // The dialog and all its controls.
 void DestroyDialog(HWND dialog);
 // The live window of a handle, or null.

@@ -64,12 +64,16 @@ OutputFile::OutputFile(std::string path) : path_(std::move(path)) {
   }
 }
 
-OutputFile::~OutputFile() {
+OutputFile::~OutputFile() { Discard(); }
+
+void OutputFile::Discard() {
   if (stream_ != nullptr && stream_ != stdout) std::fclose(stream_);
+  stream_ = nullptr;
   if (!temporary_.empty()) {
     std::remove(temporary_.c_str());
     ForgetPartialFile(slot_);
   }
+  temporary_.clear();
 }
 
 void OutputFile::Close() {
@@ -95,13 +99,7 @@ void OutputFile::Commit() {
 }
 
 void OutputFile::Fail(const std::string& what, int error) {
-  if (stream_ != nullptr && stream_ != stdout) std::fclose(stream_);
-  stream_ = nullptr;
-  if (!temporary_.empty()) {
-    std::remove(temporary_.c_str());
-    ForgetPartialFile(slot_);
-  }
-  temporary_.clear();
+  Discard();
   throw std::runtime_error(what + " " + path_ + ": " + std::strerror(error));
 }
 

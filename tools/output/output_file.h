@@ -32,6 +32,8 @@ class OutputFile {
   void Commit();
 
  private:
+  // Closes the stream and removes a temporary.
+  void Discard();
   [[noreturn]] void Fail(const std::string& what, int error);
 
   std::string path_;

@@ -1,7 +1,6 @@
 #include "options.h"
 
-#include <cerrno>
-#include <cstdlib>
+#include <charconv>
 
 namespace scene_player {
 
@@ -19,13 +18,13 @@ const char* const kUsage =
 
 namespace {
 
-// A whole number from `text`, all of it; nothing when it is not one.
+// A whole number from `text`, all of it (a '-' but no '+' or blank); nothing
+// when it is not one.
 std::optional<long> Number(const std::string& text) {
-  if (text.empty() || text[0] == '+' || text[0] == ' ') return std::nullopt;
-  char* end = nullptr;
-  errno = 0;
-  const long value = std::strtol(text.c_str(), &end, 10);
-  if (*end != '\0' || errno != 0) return std::nullopt;
+  long value = 0;
+  const char* end = text.data() + text.size();
+  const auto [stop, error] = std::from_chars(text.data(), end, value);
+  if (error != std::errc() || stop != end) return std::nullopt;
   return value;
 }
 

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <initializer_list>
 #include <map>
+#include <utility>
 #include <nlohmann/json.hpp>
 
 #include "event_names.h"
@@ -414,10 +415,10 @@ Step Reader::ReadStep(const json& value, const std::string& place, Where where) 
 
   Step step;
   step.place = place;
-  for (const char* key : {"enable", "disable"}) {
+  for (const auto& [key, kind] : {std::pair{"enable", Step::Kind::Enable}, std::pair{"disable", Step::Kind::Disable}}) {
     if (const json* rule = Find(value, key)) {
       CheckKeys(value, place, {key});
-      step.kind = key[0] == 'e' ? Step::Kind::Enable : Step::Kind::Disable;
+      step.kind = kind;
       step.rule = RuleNamed(*rule, Member(place, key));
       return step;
     }
