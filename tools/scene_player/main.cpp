@@ -61,10 +61,13 @@ class Messages {
   Messages(const Messages&) = delete;
   Messages& operator=(const Messages&) = delete;
 
+  // "PLACE: message" becomes "SCENE: PLACE: warning: message"; a text
+  // without a place is "SCENE: warning: text".
   void Warn(const std::string& text) {
     EndProgressLine();
-    std::cerr << sceneName_ << ": " << text.substr(0, text.find(": ")) << ": warning"
-              << text.substr(text.find(": ")) << '\n';
+    const std::size_t split = text.find(": ");
+    const std::string place = split == std::string::npos ? "" : text.substr(0, split + 2);
+    std::cerr << sceneName_ << ": " << place << "warning: " << text.substr(place.size()) << '\n';
   }
   void Progress(int frame) {
     if (!progress_ || (frame % 10 != 9 && frame + 1 != frames_)) return;
