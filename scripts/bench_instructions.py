@@ -5,6 +5,8 @@ their ratios as a Markdown table. Instruction counts do not depend on what
 else the machine runs, so the ratios hold where wall-clock times are noisy.
 
     scripts/bench_instructions.py [build/release/bench/chains_bench]
+
+Needs valgrind (callgrind and callgrind_annotate), which the tests do not install.
 """
 import re
 import subprocess

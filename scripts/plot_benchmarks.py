@@ -8,6 +8,8 @@ repetitions when the run had several.
     build/release/bench/chains_bench --benchmark_repetitions=5 \\
         --benchmark_format=json > bench.json
     scripts/plot_benchmarks.py bench.json docs/performance.png
+
+Needs Debian's python3-matplotlib, which the tests do not install.
 """
 import json
 import re
