@@ -1,5 +1,6 @@
 // The step on inputs the pendulum formula has no answer for, and events that
-// grow every list while the step runs. Run under AddressSanitizer and UBSan.
+// grow every list while the step runs; the direction that follows the angle.
+// Run under AddressSanitizer and UBSan.
 #include <cmath>
 #include <limits>
 
@@ -74,6 +75,18 @@ TEST(SwingSafety, CoordinatesBeyondTheIntegerRangeSaturate) {
   scene.Chain(0).angle = 135.0f;  // up and to the left: y below the range
   UpdateAllChains(scene.rd);
   EXPECT_EQ(link->head.y, kMin);
+}
+
+TEST(ChainDirection, FollowsTheChainAngleAndStaysWhenItIsNotFinite) {
+  const struct {
+    float angle;
+    int32_t direction;
+  } cases[] = {{0, 8}, {10.5f, 7}, {45, 4}, {90, 0}, {100, 0}, {102, 31}, {150, 27}, {180, 24}, {-90, 16},
+               {-270, 0}, {-300, 2}, {INFINITY, 13}, {NAN, 13},
+               // Finite but beyond the integer range: 90 - angle saturates at
+               // INT32_MIN, whose 32-step direction is -190887435 mod 32 = 21.
+               {1e30f, 21}};
+  for (const auto& c : cases) EXPECT_EQ(ChainDirection(c.angle, 13), c.direction) << c.angle;
 }
 
 }  // namespace

@@ -18,13 +18,8 @@ using nlohmann::json;
 // entries.
 std::string Scene(const std::string& extra) {
   return R"({"frames": 12, "canvas": {"width": 200, "height": 120},
-  "objects": [
-    {"name": "anchor", "x": 100, "y": 10, "width": 8, "height": 8},
-    {"name": "link1", "x": 0, "y": 0, "width": 4, "height": 20},
-    {"name": "link2", "x": 0, "y": 0, "width": 4, "height": 20},
-    {"name": "platform", "x": 0, "y": 0, "width": 30, "height": 6},
-    {"name": "rider", "x": 0, "y": 100, "width": 6, "height": 6},
-    {"name": "box", "x": 0, "y": 50, "width": 6, "height": 6}],
+  "objects": )" + Objects({{"anchor", 100, 10, 8, 8}, {"link1", 0, 0, 4, 20}, {"link2", 0, 0, 4, 20},
+                             {"platform", 0, 0, 30, 6}, {"rider", 0, 100, 6, 6}, {"box", 0, 50, 6, 6}}) + R"(,
   "timeline": [
     {"frame": 0, "do": [{"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Link", "params": ["link1"]},
       {"action": "Add Link", "params": ["link2"]}, {"action": "Add Platform", "params": ["platform"]},
@@ -78,10 +73,8 @@ TEST(SceneAuthoringTest, RepeatingEntryPlaysAsTheSameStepsWrittenFrameByFrame) {
 TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
   Folder folder;
   folder.Write("scene.json", R"({"frames": 5, "settings": {"gravity": "9.8x"},
-    "objects": [{"name": "a", "x": 10, "y": 10, "width": 4, "height": 4},
-      {"name": "b", "x": 50, "y": 10, "width": 4, "height": 4},
-      {"name": "l1", "x": 0, "y": 0, "width": 4, "height": 10}, {"name": "l2", "x": 0, "y": 0, "width": 4, "height": 12},
-      {"name": "l3", "x": 0, "y": 0, "width": 4, "height": 10}],
+    "objects": )" + Objects({{"a", 10, 10, 4, 4}, {"b", 50, 10, 4, 4}, {"l1", 0, 0, 4, 10}, {"l2", 0, 0, 4, 12},
+                               {"l3", 0, 0, 4, 10}}) + R"(,
     "timeline": [{"frame": 0, "do": [{"action": "Add Anchor", "params": ["a"]}, {"action": "Add Anchor", "params": ["b"]},
       {"action": "Add Link", "params": ["l1"]}, {"action": "Add Link", "params": ["l2"]},
       {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"}]},

@@ -51,41 +51,40 @@ uint16_t EntryWord(const void* entry, int index) {
 
 std::string Text(const char* text) { return text == nullptr ? "<none>" : text; }
 
-TEST(SceneNames, ActionTableMatchesTheCatalogue) {
+TEST(SceneNames, TablesMatchTheCatalogue) {
   EditorHost host = catalogue_test::HostWithVersion();
+  // "menu | display | parameter count" of an entry, as the catalogue and as the player's table say.
+  const auto library = [&](std::map<int, std::string>& menus, int code, const void* entry,
+                           void(TVCALL * display)(EditorHost*, int32_t, char*, int16_t)) {
+    char text[256] = "";
+    display(&host, code, text, sizeof text);
+    return Text(menus.count(code) ? menus[code].c_str() : nullptr) + " | " + text + " | " +
+           std::to_string(EntryWord(entry, 2));
+  };
+  const auto player = [](const auto& name) {
+    return Text(name.menuText) + " | " + name.displayText + " | " + std::to_string(name.paramCount);
+  };
   auto menus = MenuTexts(&GetActionMenu, &GetActionCodeFromMenu);
   for (int code = 0; code < scene_player::kActionNameCount; ++code) {
     const scene_player::ActionName& name = scene_player::kActionNames[code];
     const void* entry = GetActionInfos(&host, code);
     ASSERT_NE(entry, nullptr) << code;
-    char display[256] = "";
-    GetActionString(&host, code, display, sizeof display);
-    std::string library = Text(menus.count(code) ? menus[code].c_str() : nullptr) + " | " + display + " |";
-    std::string player = Text(name.menuText) + " | " + name.displayText + " |";
-    const int count = EntryWord(entry, 2);
-    for (int p = 0; p < count; ++p) {
+    std::string theirs = library(menus, code, entry, &GetActionString), ours = player(name);
+    for (int p = 0; p < EntryWord(entry, 2); ++p) {
       char title[256] = "";
       GetActionTitle(&host, code, static_cast<int16_t>(p), title, sizeof title);
-      library += std::string(" ") + (EntryWord(entry, 3 + p) == 1 ? "object " : "value ") + title;
+      theirs += std::string(" ") + (EntryWord(entry, 3 + p) == 1 ? "object " : "value ") + title;
     }
     for (int p = 0; p < name.paramCount; ++p) {
-      player += std::string(" ") + (name.kinds[p] == ParamKind::Object ? "object " : "value ") + name.titles[p];
+      ours += std::string(" ") + (name.kinds[p] == ParamKind::Object ? "object " : "value ") + name.titles[p];
     }
-    EXPECT_EQ(player, library) << "action " << code;
+    EXPECT_EQ(ours, theirs) << "action " << code;
   }
-}
-
-TEST(SceneNames, ExpressionTableMatchesTheCatalogue) {
-  EditorHost host = catalogue_test::HostWithVersion();
-  auto menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
+  menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
   for (int code = 0; code < scene_player::kExpressionNameCount; ++code) {
-    const scene_player::ExpressionName& name = scene_player::kExpressionNames[code];
     const void* entry = GetExpressionInfos(&host, code);
     ASSERT_NE(entry, nullptr) << code;
-    char display[256] = "";
-    GetExpressionString(&host, code, display, sizeof display);
-    EXPECT_EQ(Text(name.menuText) + " | " + name.displayText + " | " + std::to_string(name.paramCount),
-              menus[code] + " | " + display + " | " + std::to_string(EntryWord(entry, 2)))
+    EXPECT_EQ(player(scene_player::kExpressionNames[code]), library(menus, code, entry, &GetExpressionString))
         << "expression " << code;
   }
 }

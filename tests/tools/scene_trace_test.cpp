@@ -18,16 +18,11 @@ using nlohmann::json;
 // One anchor at (100, 50), three links 32 high, one platform, a rider that an
 // "On Swing" rule moves by the platform's DeltaX and DeltaY. The angle is set
 // to a fraction, so it only survives if it reaches the library as a float.
-constexpr const char* kScene = R"({
+const std::string kScene = R"({
   "settings": {"startAngle": "90", "mass": "1", "gravity": "9.81", "linkSpacing": "0"},
   "frames": 6,
-  "objects": [
-    {"name": "anchor", "x": 100, "y": 50, "width": 16, "height": 16},
-    {"name": "link1", "x": 0, "y": 0, "width": 8, "height": 32},
-    {"name": "link2", "x": 0, "y": 0, "width": 8, "height": 32},
-    {"name": "link3", "x": 0, "y": 0, "width": 8, "height": 32},
-    {"name": "platform", "x": 0, "y": 0, "width": 40, "height": 10},
-    {"name": "rider", "x": 7, "y": -3, "width": 10, "height": 20}],
+  "objects": )" + Objects({{"anchor", 100, 50, 16, 16}, {"link1", 0, 0, 8, 32}, {"link2", 0, 0, 8, 32},
+                             {"link3", 0, 0, 8, 32}, {"platform", 0, 0, 40, 10}, {"rider", 7, -3, 10, 20}}) + R"(,
   "timeline": [{"frame": 0, "do": [
     {"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Link", "params": ["link1"]},
     {"action": "Add Link  %0", "params": ["link2"]}, {"action": "Add Link", "params": ["link3"]},
