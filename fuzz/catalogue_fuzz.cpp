@@ -52,10 +52,20 @@ void WithBuffer(int16_t size, Write write) {
   if (touched) Check(std::memchr(buffer, '\0', room) != nullptr);
 }
 
-void CheckMenu(HMENU menu, bool compatible) {
+// The items of a menu and of its submenus.
+int ItemCount(HMENU menu) {
+  int count = GetMenuItemCount(menu);
+  for (int i = 0, top = count; i < top; ++i) {
+    if (const HMENU submenu = GetSubMenu(menu, i)) count += ItemCount(submenu);
+  }
+  return count;
+}
+
+// A menu handed over holds every item of its family: `items` in all.
+void CheckMenu(HMENU menu, bool compatible, int items) {
   if (!compatible) Check(menu == nullptr);
   if (menu == nullptr) return;
-  Check(GetMenuItemCount(menu) > 0);
+  Check(ItemCount(menu) == items);
   Check(DestroyMenu(menu) == TRUE);
 }
 
@@ -98,9 +108,9 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     const auto param = static_cast<int16_t>(in.Near(0, 6));
     const auto bufferSize = static_cast<int16_t>(in.Near(2, 40));
     switch (routine) {
-      case 0: CheckMenu(GetConditionMenu(&host, nullptr, nullptr), compatible); break;
-      case 1: CheckMenu(GetActionMenu(&host, nullptr, nullptr), compatible); break;
-      case 2: CheckMenu(GetExpressionMenu(&host, nullptr, nullptr), compatible); break;
+      case 0: CheckMenu(GetConditionMenu(&host, nullptr, nullptr), compatible, 2); break;
+      case 1: CheckMenu(GetActionMenu(&host, nullptr, nullptr), compatible, 18); break;
+      case 2: CheckMenu(GetExpressionMenu(&host, nullptr, nullptr), compatible, 21); break;
       case 3: CheckCode(in.MenuId(26000, 2), 26000, 2, [&](int32_t id) { return GetConditionCodeFromMenu(&host, id); }); break;
       case 4: CheckCode(in.MenuId(25000, 16), 25000, 16, [&](int32_t id) { return GetActionCodeFromMenu(&host, id); }); break;
       case 5: CheckCode(in.MenuId(27000, 17), 27000, 17, [&](int32_t id) { return GetExpressionCodeFromMenu(&host, id); }); break;

@@ -5,7 +5,8 @@
 // opened and confirmed or cancelled. Invariants:
 // - the display writes inside the rectangle it is given, draws exactly the
 //   calls of its path, labels each rectangle with its own corner or centre
-//   in at most 25 characters, and refreshes the rectangle it filled;
+//   in at most 25 characters, none cut off, and refreshes the rectangle it
+//   filled;
 // - the dialog shows what is stored, and OK stores it back unchanged but
 //   for the dialog's own rules (texts cut to 9 characters, the view flag
 //   0 or 1); Cancel changes nothing.
@@ -88,7 +89,7 @@ void Display(EditData edit, uint8_t view, int32_t left, int32_t top) {
     Check(std::sscanf(calls[1 + 2 * shape].c_str(), "Rectangle editor %lld %lld", &cornerX, &cornerY) == 2);
     const std::string& label = calls[2 + 2 * shape];
     const std::size_t open = label.find('"'), close = label.find('"', open + 1);
-    Check(close != std::string::npos && close - open - 1 <= 25);
+    Check(close != std::string::npos && close - open - 1 <= 25 && label[close - 1] == ')');
     Check(std::sscanf(label.c_str(), "DrawText editor \"(%lld,%lld)\"", &x, &y) == 2);
     // The anchor's label shows its top-left corner, a platform's its centre.
     Check(shape == 0 ? x == cornerX && y == cornerY
