@@ -21,14 +21,6 @@
 
 namespace {
 
-// The program, with chain indexes as a number kind of its own.
-class Program : public FuzzInput {
- public:
-  using FuzzInput::FuzzInput;
-  // Mostly small indexes, sometimes any 32-bit value.
-  int32_t Index() { return Near(1, 8); }
-};
-
 class Run {
  public:
   Run(const uint8_t* data, size_t size) : program_(data, size), host_(Settings(program_)) {
@@ -50,7 +42,7 @@ class Run {
 
  private:
   // Any 100 bytes, as a damaged or hand-edited stored game may hold.
-  static EditData Settings(Program& program) {
+  static EditData Settings(FuzzInput& program) {
     uint8_t bytes[sizeof(EditData)];
     for (uint8_t& byte : bytes) byte = program.Byte();
     EditData edit;
@@ -98,7 +90,7 @@ class Run {
         if (code <= 2) {
           host_.Action(code, ObjectArgument());
         } else {
-          const int32_t index = program_.Index();
+          const int32_t index = program_.Near(1, 8);
           const int32_t integer = program_.Int();
           const float value = std::bit_cast<float>(program_.Int());
           host_.Action(code, index, integer, value);
@@ -106,12 +98,12 @@ class Run {
         break;
       }
       case 2:
-        host_.Condition(program_.Byte() % 2, program_.Index());
+        host_.Condition(program_.Byte() % 2, program_.Near(1, 8));
         break;
       case 3: {
         const int code = program_.Byte() % 17;
-        const int32_t first = program_.Index();
-        host_.Expression(code, {first, program_.Index()});
+        const int32_t first = program_.Near(1, 8);
+        host_.Expression(code, {first, program_.Near(1, 8)});
         // Mass, angle, speed, spacing, the deltas and the acceleration are
         // floats; counts, coordinates and indexes are integers.
         constexpr uint32_t kFloatCodes = 1u << 4 | 1u << 5 | 1u << 6 | 1u << 7 | 1u << 11 | 1u << 12 | 1u << 13;
@@ -135,7 +127,7 @@ class Run {
     }
   }
 
-  Program program_;
+  FuzzInput program_;
   standin::Host host_;
   // An object of the frame that no action is ever given.
   HostObject* bystander_ = host_.AddObject(7, 7, 7, {7, 7});
