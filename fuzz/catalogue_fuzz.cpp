@@ -12,15 +12,13 @@
 #include <cstring>
 #include <vector>
 
+#include "catalogue/catalogue_helpers.h"
 #include "frame/exports.h"
 #include "frame/host_services.h"
 #include "fuzz_input.h"
 #include "standin_win32.h"
 
 namespace {
-
-uint32_t g_version = 0;
-uint32_t TVCALL AnswerVersion() { return g_version; }
 
 // The input, with menu ids of an event family as a number kind of its own.
 class Input : public FuzzInput {
@@ -35,21 +33,13 @@ class Input : public FuzzInput {
   }
 };
 
-constexpr uint8_t kSentinel = 0xCD;
-constexpr size_t kGuard = 32;
-
 // Calls `write(buffer, size)` on a fenced buffer of max(size, 0) bytes and
 // checks the fence and the terminator.
 template <typename Write>
 void WithBuffer(int16_t size, Write write) {
-  const size_t room = size > 0 ? static_cast<size_t>(size) : 0;
-  std::vector<uint8_t> bytes(kGuard + room + kGuard, kSentinel);
-  char* buffer = reinterpret_cast<char*>(bytes.data() + kGuard);
-  write(buffer, size);
-  for (size_t i = 0; i < kGuard; ++i) Check(bytes[i] == kSentinel && bytes[kGuard + room + i] == kSentinel);
-  bool touched = false;
-  for (size_t i = 0; i < room; ++i) touched = touched || bytes[kGuard + i] != kSentinel;
-  if (touched) Check(std::memchr(buffer, '\0', room) != nullptr);
+  catalogue_test::GuardedBuffer buffer(size > 0 ? static_cast<size_t>(size) : 0);
+  write(buffer.data(), size);
+  Check(buffer.guardsIntact() && buffer.text() != "<no terminator>");
 }
 
 // The items of a menu and of its submenus.
@@ -93,12 +83,11 @@ void CheckEntry(const void* entry, int32_t code, int count) {
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
   Input in(data, size);
-  EditorHost host{};
   const uint8_t hostKind = in.Byte();
-  if (hostKind % 4 != 0) host.slot[kEditorSlotGetVersion] = reinterpret_cast<void*>(&AnswerVersion);
-  g_version = hostKind % 4 == 1 ? (0x02000000u | 218u) : static_cast<uint32_t>(in.Int());
-  const bool compatible = host.slot[kEditorSlotGetVersion] != nullptr && (g_version & 0xFFFu) >= 218 &&
-                          (g_version & 0xFFFF0000u) >= 0x02000000u && (g_version & 0x8000u) == 0;
+  const uint32_t version = hostKind % 4 == 1 ? (0x02000000u | 218u) : static_cast<uint32_t>(in.Int());
+  EditorHost host = hostKind % 4 != 0 ? catalogue_test::HostWithVersion(version) : EditorHost{};
+  const bool compatible = hostKind % 4 != 0 && (version & 0xFFFu) >= 218 && (version & 0xFFFF0000u) >= 0x02000000u &&
+                          (version & 0x8000u) == 0;
   const size_t menusBefore = StandinLiveMenuCount();
   const size_t blocksBefore = StandinLiveLocalBlockCount();
 

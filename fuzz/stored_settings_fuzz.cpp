@@ -19,6 +19,7 @@
 #include <string>
 #include <vector>
 
+#include "catalogue/catalogue_helpers.h"
 #include "editor_window.h"
 #include "frame/edit_data.h"
 #include "frame/exports.h"
@@ -29,8 +30,6 @@
 #include "standin_win32.h"
 
 namespace {
-
-uint32_t TVCALL CompatibleVersion() { return 0x02000000u | 218u; }
 
 int32_t Wrapped(int64_t value) { return static_cast<int32_t>(static_cast<uint32_t>(value)); }
 
@@ -108,8 +107,7 @@ void CutText(char (&text)[kSettingTextSize]) {
 }
 
 void Dialog(const EditData& stored, bool confirm) {
-  EditorHost host{};
-  host.slot[kEditorSlotGetVersion] = reinterpret_cast<void*>(&CompatibleVersion);
+  EditorHost host = catalogue_test::HostWithVersion();
   EditData edit = stored;
   int shown = 0;
   StandinSetDialogAuthor([&](HWND dialog) {

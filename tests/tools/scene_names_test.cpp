@@ -8,6 +8,7 @@
 
 #include <cstring>
 #include <map>
+#include <regex>
 #include <string>
 
 #include "catalogue/catalogue_helpers.h"
@@ -19,26 +20,17 @@ namespace {
 using scene_player::ParamKind;
 
 // Menu texts by event code, from every item of a menu and its submenus.
-void CollectMenuTexts(HMENU menu, int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t), EditorHost& host,
-                      std::map<int, std::string>& texts) {
-  for (int position = 0; position < GetMenuItemCount(menu); ++position) {
-    if (HMENU sub = GetSubMenu(menu, position); sub != nullptr) {
-      CollectMenuTexts(sub, codeFromMenu, host, texts);
-      continue;
-    }
-    char text[256] = "";
-    GetMenuStringA(menu, static_cast<UINT>(position), text, sizeof text, MF_BYPOSITION);
-    texts[codeFromMenu(&host, static_cast<int32_t>(GetMenuItemID(menu, position)))] = text;
-  }
-}
-
 std::map<int, std::string> MenuTexts(HMENU(TVCALL* getMenu)(EditorHost*, void*, void*),
                                      int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t)) {
   EditorHost host = catalogue_test::HostWithVersion();
-  std::map<int, std::string> texts;
   const HMENU menu = getMenu(&host, nullptr, nullptr);
-  CollectMenuTexts(menu, codeFromMenu, host, texts);
+  const std::string dump = catalogue_test::DumpMenu(menu);  // "text=id|popup{text=id|...}|..."
   DestroyMenu(menu);
+  std::map<int, std::string> texts;
+  const std::regex item(R"(([^|{}=]+)=(\d+))");
+  for (std::sregex_iterator it(dump.begin(), dump.end(), item), end; it != end; ++it) {
+    texts[codeFromMenu(&host, std::stoi((*it)[2]))] = (*it)[1];
+  }
   return texts;
 }
 
