@@ -1,5 +1,5 @@
 // Runs an arbitrary event program against one run-time object created from
-// any stored settings, through the stand-in host: objects created and
+// any stored settings (it is always made), through the stand-in host: objects created and
 // destroyed, any action with any index and value (infinities and NaN
 // included), conditions, expressions and frames, with further actions run
 // from inside "On Swing". Nothing may crash, read freed memory or convert a
@@ -24,6 +24,7 @@ namespace {
 class Run {
  public:
   Run(const uint8_t* data, size_t size) : program_(data, size), host_(Settings(program_)) {
+    Check(host_.created());  // whatever the settings hold
     host_.onEvent = [this](int32_t, int32_t) {
       // An "On Swing" rule of up to three actions, conditions or expressions.
       for (int i = 0; i < 3 && !program_.done() && depth_ < 2; ++i) {
