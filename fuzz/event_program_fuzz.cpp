@@ -62,6 +62,22 @@ class Run {
     for (uint32_t i = 0; i < ChainCount(rd); ++i) Check(live(rd.chains->At(i).anchor));
   }
 
+  // Every byte of the chains, of their anchors and of the listed objects.
+  std::vector<uint8_t> Snapshot() {
+    RunData& rd = host_.extension();
+    std::vector<uint8_t> bytes;
+    const auto add = [&bytes](const void* at, size_t size) {
+      bytes.insert(bytes.end(), static_cast<const uint8_t*>(at), static_cast<const uint8_t*>(at) + size);
+    };
+    for (uint32_t i = 0; i < ChainCount(rd); ++i) {
+      add(&rd.chains->At(i), sizeof(ChainRecord));
+      add(rd.chains->At(i).anchor, sizeof(HostObject));
+    }
+    for (uint32_t i = 0; i < LinkCount(rd); ++i) add(rd.links->At(i), sizeof(HostObject));
+    for (uint32_t i = 0; i < PlatformCount(rd); ++i) add(rd.platforms->At(i), sizeof(HostObject));
+    return bytes;
+  }
+
   // The host frees the objects destroyed so far once the frame has run.
   void RunFrame() {
     host_.RunFrame();
@@ -94,13 +110,27 @@ class Run {
           const int32_t index = program_.Near(1, 8);
           const int32_t integer = program_.Int();
           const float value = std::bit_cast<float>(program_.Int());
+          // An index that addresses no chain changes nothing (but for the
+          // actions on all chains); a float setter reads its value, once.
+          const bool addressed = static_cast<uint32_t>(index) < ChainCount(host_.extension());
+          const std::vector<uint8_t> before = Snapshot();
+          const int floatReads = host_.floatParameterCalls;
           host_.Action(code, index, integer, value);
+          constexpr uint32_t kOnAllChains = 1u << 9 | 1u << 11 | 1u << 13;
+          constexpr uint32_t kFloatSetters = 1u << 5 | 1u << 6 | 1u << 7 | 1u << 8 | 1u << 15;
+          Check(addressed || ((kOnAllChains >> code) & 1u) || Snapshot() == before);
+          Check(host_.floatParameterCalls == floatReads + static_cast<int>((kFloatSetters >> code) & 1u));
         }
         break;
       }
-      case 2:
-        host_.Condition(program_.Byte() % 2, program_.Near(1, 8));
+      case 2: {
+        const int code = program_.Byte() % 2;
+        const int32_t index = program_.Near(1, 8);
+        // "Chain is swinging" only of a chain there is, "On Swing" never of a negative index.
+        const bool possible = code == 0 ? static_cast<uint32_t>(index) < ChainCount(host_.extension()) : index >= 0;
+        Check(host_.Condition(code, index) == 0 || possible);
         break;
+      }
       case 3: {
         const int code = program_.Byte() % 17;
         const int32_t first = program_.Near(1, 8);
