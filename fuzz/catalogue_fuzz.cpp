@@ -20,18 +20,13 @@
 
 namespace {
 
-// The input, with menu ids of an event family as a number kind of its own.
-class Input : public FuzzInput {
- public:
-  using FuzzInput::FuzzInput;
-  // Mostly the menu ids of `count` events numbered from `first` in steps of
-  // 10, sometimes one beside them, sometimes any 32-bit value.
-  int32_t MenuId(int32_t first, int count) {
-    const uint8_t b = Byte();
-    if (b < 192) return first + 10 * (b % (count + 1));
-    return b < 224 ? first + b % 20 - 2 : Int();
-  }
-};
+// Mostly the menu ids of `count` events numbered from `first` in steps of
+// 10, sometimes one beside them, sometimes any 32-bit value.
+int32_t MenuId(FuzzInput& in, int32_t first, int count) {
+  const uint8_t b = in.Byte();
+  if (b < 192) return first + 10 * (b % (count + 1));
+  return b < 224 ? first + b % 20 - 2 : in.Int();
+}
 
 // Calls `write(buffer, size)` on a fenced buffer of max(size, 0) bytes and
 // checks the fence and the terminator.
@@ -82,7 +77,7 @@ void CheckEntry(const void* entry, int32_t code, int count) {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
-  Input in(data, size);
+  FuzzInput in(data, size);
   const uint8_t hostKind = in.Byte();
   const uint32_t version = hostKind % 4 == 1 ? (0x02000000u | 218u) : static_cast<uint32_t>(in.Int());
   EditorHost host = hostKind % 4 != 0 ? catalogue_test::HostWithVersion(version) : EditorHost{};
@@ -100,9 +95,9 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
       case 0: CheckMenu(GetConditionMenu(&host, nullptr, nullptr), compatible, 2); break;
       case 1: CheckMenu(GetActionMenu(&host, nullptr, nullptr), compatible, 18); break;
       case 2: CheckMenu(GetExpressionMenu(&host, nullptr, nullptr), compatible, 21); break;
-      case 3: CheckCode(in.MenuId(26000, 2), 26000, 2, [&](int32_t id) { return GetConditionCodeFromMenu(&host, id); }); break;
-      case 4: CheckCode(in.MenuId(25000, 16), 25000, 16, [&](int32_t id) { return GetActionCodeFromMenu(&host, id); }); break;
-      case 5: CheckCode(in.MenuId(27000, 17), 27000, 17, [&](int32_t id) { return GetExpressionCodeFromMenu(&host, id); }); break;
+      case 3: CheckCode(MenuId(in, 26000, 2), 26000, 2, [&](int32_t id) { return GetConditionCodeFromMenu(&host, id); }); break;
+      case 4: CheckCode(MenuId(in, 25000, 16), 25000, 16, [&](int32_t id) { return GetActionCodeFromMenu(&host, id); }); break;
+      case 5: CheckCode(MenuId(in, 27000, 17), 27000, 17, [&](int32_t id) { return GetExpressionCodeFromMenu(&host, id); }); break;
       case 6: CheckEntry(GetConditionInfos(&host, code), code, 2); break;
       case 7: CheckEntry(GetActionInfos(&host, code), code, 16); break;
       case 8: CheckEntry(GetExpressionInfos(&host, code), code, 17); break;
