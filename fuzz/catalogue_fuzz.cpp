@@ -12,6 +12,7 @@
 #include <cstring>
 #include <vector>
 
+#include "catalogue/catalogue_helpers.h"
 #include "frame/exports.h"
 #include "frame/host_services.h"
 #include "fuzz_input.h"
@@ -19,43 +20,37 @@
 
 namespace {
 
-uint32_t g_version = 0;
-uint32_t TVCALL AnswerVersion() { return g_version; }
-
-// The input, with menu ids of an event family as a number kind of its own.
-class Input : public FuzzInput {
- public:
-  using FuzzInput::FuzzInput;
-  // Mostly the menu ids of `count` events numbered from `first` in steps of
-  // 10, sometimes one beside them, sometimes any 32-bit value.
-  int32_t MenuId(int32_t first, int count) {
-    const uint8_t b = Byte();
-    if (b < 192) return first + 10 * (b % (count + 1));
-    return b < 224 ? first + b % 20 - 2 : Int();
-  }
-};
-
-constexpr uint8_t kSentinel = 0xCD;
-constexpr size_t kGuard = 32;
+// Mostly the menu ids of `count` events numbered from `first` in steps of
+// 10, sometimes one beside them, sometimes any 32-bit value.
+int32_t MenuId(FuzzInput& in, int32_t first, int count) {
+  const uint8_t b = in.Byte();
+  if (b < 192) return first + 10 * (b % (count + 1));
+  return b < 224 ? first + b % 20 - 2 : in.Int();
+}
 
 // Calls `write(buffer, size)` on a fenced buffer of max(size, 0) bytes and
 // checks the fence and the terminator.
 template <typename Write>
 void WithBuffer(int16_t size, Write write) {
-  const size_t room = size > 0 ? static_cast<size_t>(size) : 0;
-  std::vector<uint8_t> bytes(kGuard + room + kGuard, kSentinel);
-  char* buffer = reinterpret_cast<char*>(bytes.data() + kGuard);
-  write(buffer, size);
-  for (size_t i = 0; i < kGuard; ++i) Check(bytes[i] == kSentinel && bytes[kGuard + room + i] == kSentinel);
-  bool touched = false;
-  for (size_t i = 0; i < room; ++i) touched = touched || bytes[kGuard + i] != kSentinel;
-  if (touched) Check(std::memchr(buffer, '\0', room) != nullptr);
+  catalogue_test::GuardedBuffer buffer(size > 0 ? static_cast<size_t>(size) : 0);
+  write(buffer.data(), size);
+  Check(buffer.guardsIntact() && buffer.text() != "<no terminator>");
 }
 
-void CheckMenu(HMENU menu, bool compatible) {
+// The items of a menu and of its submenus.
+int ItemCount(HMENU menu) {
+  int count = GetMenuItemCount(menu);
+  for (int i = 0, top = count; i < top; ++i) {
+    if (const HMENU submenu = GetSubMenu(menu, i)) count += ItemCount(submenu);
+  }
+  return count;
+}
+
+// A menu handed over holds every item of its family: `items` in all.
+void CheckMenu(HMENU menu, bool compatible, int items) {
   if (!compatible) Check(menu == nullptr);
   if (menu == nullptr) return;
-  Check(GetMenuItemCount(menu) > 0);
+  Check(ItemCount(menu) == items);
   Check(DestroyMenu(menu) == TRUE);
 }
 
@@ -82,13 +77,12 @@ void CheckEntry(const void* entry, int32_t code, int count) {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
-  Input in(data, size);
-  EditorHost host{};
+  FuzzInput in(data, size);
   const uint8_t hostKind = in.Byte();
-  if (hostKind % 4 != 0) host.slot[kEditorSlotGetVersion] = reinterpret_cast<void*>(&AnswerVersion);
-  g_version = hostKind % 4 == 1 ? (0x02000000u | 218u) : static_cast<uint32_t>(in.Int());
-  const bool compatible = host.slot[kEditorSlotGetVersion] != nullptr && (g_version & 0xFFFu) >= 218 &&
-                          (g_version & 0xFFFF0000u) >= 0x02000000u && (g_version & 0x8000u) == 0;
+  const uint32_t version = hostKind % 4 == 1 ? (0x02000000u | 218u) : static_cast<uint32_t>(in.Int());
+  EditorHost host = hostKind % 4 != 0 ? catalogue_test::HostWithVersion(version) : EditorHost{};
+  const bool compatible = hostKind % 4 != 0 && (version & 0xFFFu) >= 218 && (version & 0xFFFF0000u) >= 0x02000000u &&
+                          (version & 0x8000u) == 0;
   const size_t menusBefore = StandinLiveMenuCount();
   const size_t blocksBefore = StandinLiveLocalBlockCount();
 
@@ -98,12 +92,12 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     const auto param = static_cast<int16_t>(in.Near(0, 6));
     const auto bufferSize = static_cast<int16_t>(in.Near(2, 40));
     switch (routine) {
-      case 0: CheckMenu(GetConditionMenu(&host, nullptr, nullptr), compatible); break;
-      case 1: CheckMenu(GetActionMenu(&host, nullptr, nullptr), compatible); break;
-      case 2: CheckMenu(GetExpressionMenu(&host, nullptr, nullptr), compatible); break;
-      case 3: CheckCode(in.MenuId(26000, 2), 26000, 2, [&](int32_t id) { return GetConditionCodeFromMenu(&host, id); }); break;
-      case 4: CheckCode(in.MenuId(25000, 16), 25000, 16, [&](int32_t id) { return GetActionCodeFromMenu(&host, id); }); break;
-      case 5: CheckCode(in.MenuId(27000, 17), 27000, 17, [&](int32_t id) { return GetExpressionCodeFromMenu(&host, id); }); break;
+      case 0: CheckMenu(GetConditionMenu(&host, nullptr, nullptr), compatible, 2); break;
+      case 1: CheckMenu(GetActionMenu(&host, nullptr, nullptr), compatible, 18); break;
+      case 2: CheckMenu(GetExpressionMenu(&host, nullptr, nullptr), compatible, 21); break;
+      case 3: CheckCode(MenuId(in, 26000, 2), 26000, 2, [&](int32_t id) { return GetConditionCodeFromMenu(&host, id); }); break;
+      case 4: CheckCode(MenuId(in, 25000, 16), 25000, 16, [&](int32_t id) { return GetActionCodeFromMenu(&host, id); }); break;
+      case 5: CheckCode(MenuId(in, 27000, 17), 27000, 17, [&](int32_t id) { return GetExpressionCodeFromMenu(&host, id); }); break;
       case 6: CheckEntry(GetConditionInfos(&host, code), code, 2); break;
       case 7: CheckEntry(GetActionInfos(&host, code), code, 16); break;
       case 8: CheckEntry(GetExpressionInfos(&host, code), code, 17); break;

@@ -1,5 +1,5 @@
 // Runs an arbitrary event program against one run-time object created from
-// any stored settings, through the stand-in host: objects created and
+// any stored settings (it is always made), through the stand-in host: objects created and
 // destroyed, any action with any index and value (infinities and NaN
 // included), conditions, expressions and frames, with further actions run
 // from inside "On Swing". Nothing may crash, read freed memory or convert a
@@ -21,17 +21,10 @@
 
 namespace {
 
-// The program, with chain indexes as a number kind of its own.
-class Program : public FuzzInput {
- public:
-  using FuzzInput::FuzzInput;
-  // Mostly small indexes, sometimes any 32-bit value.
-  int32_t Index() { return Near(1, 8); }
-};
-
 class Run {
  public:
   Run(const uint8_t* data, size_t size) : program_(data, size), host_(Settings(program_)) {
+    Check(host_.created());  // whatever the settings hold
     host_.onEvent = [this](int32_t, int32_t) {
       // An "On Swing" rule of up to three actions, conditions or expressions.
       for (int i = 0; i < 3 && !program_.done() && depth_ < 2; ++i) {
@@ -50,7 +43,7 @@ class Run {
 
  private:
   // Any 100 bytes, as a damaged or hand-edited stored game may hold.
-  static EditData Settings(Program& program) {
+  static EditData Settings(FuzzInput& program) {
     uint8_t bytes[sizeof(EditData)];
     for (uint8_t& byte : bytes) byte = program.Byte();
     EditData edit;
@@ -67,6 +60,22 @@ class Run {
     for (uint32_t i = 0; i < PlatformCount(rd); ++i) Check(live(rd.platforms->At(i)));
     for (uint32_t i = 0; i < LinkCount(rd); ++i) Check(live(rd.links->At(i)));
     for (uint32_t i = 0; i < ChainCount(rd); ++i) Check(live(rd.chains->At(i).anchor));
+  }
+
+  // Every byte of the chains, of their anchors and of the listed objects.
+  std::vector<uint8_t> Snapshot() {
+    RunData& rd = host_.extension();
+    std::vector<uint8_t> bytes;
+    const auto add = [&bytes](const void* at, size_t size) {
+      bytes.insert(bytes.end(), static_cast<const uint8_t*>(at), static_cast<const uint8_t*>(at) + size);
+    };
+    for (uint32_t i = 0; i < ChainCount(rd); ++i) {
+      add(&rd.chains->At(i), sizeof(ChainRecord));
+      add(rd.chains->At(i).anchor, sizeof(HostObject));
+    }
+    for (uint32_t i = 0; i < LinkCount(rd); ++i) add(rd.links->At(i), sizeof(HostObject));
+    for (uint32_t i = 0; i < PlatformCount(rd); ++i) add(rd.platforms->At(i), sizeof(HostObject));
+    return bytes;
   }
 
   // The host frees the objects destroyed so far once the frame has run.
@@ -98,20 +107,34 @@ class Run {
         if (code <= 2) {
           host_.Action(code, ObjectArgument());
         } else {
-          const int32_t index = program_.Index();
+          const int32_t index = program_.Near(1, 8);
           const int32_t integer = program_.Int();
           const float value = std::bit_cast<float>(program_.Int());
+          // An index that addresses no chain changes nothing (but for the
+          // actions on all chains); a float setter reads its value, once.
+          const bool addressed = static_cast<uint32_t>(index) < ChainCount(host_.extension());
+          const std::vector<uint8_t> before = Snapshot();
+          const int floatReads = host_.floatParameterCalls;
           host_.Action(code, index, integer, value);
+          constexpr uint32_t kOnAllChains = 1u << 9 | 1u << 11 | 1u << 13;
+          constexpr uint32_t kFloatSetters = 1u << 5 | 1u << 6 | 1u << 7 | 1u << 8 | 1u << 15;
+          Check(addressed || ((kOnAllChains >> code) & 1u) || Snapshot() == before);
+          Check(host_.floatParameterCalls == floatReads + static_cast<int>((kFloatSetters >> code) & 1u));
         }
         break;
       }
-      case 2:
-        host_.Condition(program_.Byte() % 2, program_.Index());
+      case 2: {
+        const int code = program_.Byte() % 2;
+        const int32_t index = program_.Near(1, 8);
+        // "Chain is swinging" only of a chain there is, "On Swing" never of a negative index.
+        const bool possible = code == 0 ? static_cast<uint32_t>(index) < ChainCount(host_.extension()) : index >= 0;
+        Check(host_.Condition(code, index) == 0 || possible);
         break;
+      }
       case 3: {
         const int code = program_.Byte() % 17;
-        const int32_t first = program_.Index();
-        host_.Expression(code, {first, program_.Index()});
+        const int32_t first = program_.Near(1, 8);
+        host_.Expression(code, {first, program_.Near(1, 8)});
         // Mass, angle, speed, spacing, the deltas and the acceleration are
         // floats; counts, coordinates and indexes are integers.
         constexpr uint32_t kFloatCodes = 1u << 4 | 1u << 5 | 1u << 6 | 1u << 7 | 1u << 11 | 1u << 12 | 1u << 13;
@@ -135,7 +158,7 @@ class Run {
     }
   }
 
-  Program program_;
+  FuzzInput program_;
   standin::Host host_;
   // An object of the frame that no action is ever given.
   HostObject* bystander_ = host_.AddObject(7, 7, 7, {7, 7});

@@ -64,12 +64,12 @@ inline std::string DumpMenu(HMENU menu) {
     dump += (position > 0 ? "|" : "") + std::string(text);
     if (const UINT id = GetMenuItemID(menu, position); id == 0xFFFFFFFFu) {
       dump += "{" + DumpMenu(GetSubMenu(menu, position)) + "}";
-    } else if (const UINT state = GetMenuState(menu, static_cast<UINT>(position), MF_BYPOSITION); state != 0) {
-      char bits[48];
-      std::snprintf(bits, sizeof bits, "=%u state=0x%X", id, state);
-      dump += bits;
     } else {
-      dump += "=" + std::to_string(id);
+      char bits[32] = "";
+      if (const UINT state = GetMenuState(menu, static_cast<UINT>(position), MF_BYPOSITION); state != 0) {
+        std::snprintf(bits, sizeof bits, " state=0x%X", state);
+      }
+      dump += "=" + std::to_string(id) + bits;
     }
   }
   return dump;

@@ -4,7 +4,6 @@
 // ordinals the Windows loader resolves.
 #include <gtest/gtest.h>
 
-#include <climits>
 #include <cstring>
 #include <string>
 #include <vector>
@@ -132,23 +131,6 @@ TEST(EditorDisplay, TemplateSettingsSetTheRadiusAndTheSwing) {
     EXPECT_EQ(edit.objectWidth, c.width);
     EXPECT_EQ(edit.objectHeight, c.height);
   }
-}
-
-// The longest label, two 11-character numbers, fits its buffer. Sizes at the
-// ends of the 32-bit range wrap as the host's arithmetic does; the stored-
-// settings fuzzer holds every other label to its rectangle.
-TEST(EditorDisplay, ExtremeSettingsWrapAndTheLongestLabelFits) {
-  EditData edit = Defaults(1);
-  std::strcpy(edit.linkSpacingText, "-1e999");
-  edit.linkHeight = INT_MAX;
-  edit.linkCount = INT_MAX;
-  edit.anchorWidth = edit.anchorHeight = -1;  // half of it is 0: division truncates toward zero
-  edit.platformWidth = edit.platformHeight = INT_MIN;
-  RECT rect = Place(INT_MIN, INT_MIN);
-  const Calls calls = Display(nullptr, edit, rect);
-  ASSERT_EQ(calls.size(), 10u);
-  EXPECT_EQ(calls[2], "DrawText editor \"(-2147483648,-2147483648)\" -1 -2147483648 -2147483648 2147483646 "
-                      "2147483646 1 0 0 1 0 0 0 0 0 8");
 }
 
 }  // namespace

@@ -1,25 +1,11 @@
 // The actions and conditions, run through their tables as the host runs them:
 // "On Swing" also from inside the events the swing step raises.
 #include <cstring>
-#include <limits>
 #include <vector>
 
 #include "event_scene.h"
 
 namespace {
-
-// Every byte of every chain record and of its anchor, padding included, to
-// show that an action changed nothing.
-std::vector<unsigned char> ChainBytes(const RunData& rd) {
-  std::vector<unsigned char> bytes;
-  for (uint32_t i = 0; i < rd.chains->Count(); ++i) {
-    const auto* record = reinterpret_cast<const unsigned char*>(&rd.chains->At(i));
-    const auto* anchor = reinterpret_cast<const unsigned char*>(rd.chains->At(i).anchor);
-    bytes.insert(bytes.end(), record, record + sizeof(ChainRecord));
-    bytes.insert(bytes.end(), anchor, anchor + sizeof(HostObject));
-  }
-  return bytes;
-}
 
 class ActionTest : public EventTest {};
 
@@ -104,30 +90,6 @@ TEST_F(ActionTest, SetAnchorWritesTheAnchorsPositionAndNothingElse) {
   expected.head.y = -2;
   expected.changed = 1;
   EXPECT_EQ(std::memcmp(anchor, &expected, sizeof expected), 0);
-}
-
-// Every action that takes an index does nothing with one that addresses no
-// chain, with no chains at all or with two, and the conditions are false;
-// the float setters still ask for their value, once.
-TEST_F(ActionTest, IndexThatAddressesNoChainChangesNothing) {
-  constexpr int32_t kMin = std::numeric_limits<int32_t>::min(), kMax = std::numeric_limits<int32_t>::max();
-  const int indexed[] = {action::SetAnchorX, action::SetAnchorY, action::SetMass, action::SetAngle,
-                         action::SetSpeed, action::SetLinkSpacing, action::StartChain, action::StopChain,
-                         action::UpdateChain, action::SetAcceleration};
-  for (int chains = 0; chains <= 2; chains += 2) {
-    for (int i = 0; i < chains; ++i) Add(action::AddAnchor, 100 + 200 * i, 50);
-    host.Action(action::StartAll);
-    const std::vector<unsigned char> before = ChainBytes(host.extension());
-    const int calls = host.floatParameterCalls;
-    for (int32_t index : {-1, chains, kMin, kMax}) {
-      SCOPED_TRACE(testing::Message() << "index " << index << " of " << chains);
-      EXPECT_EQ(host.Condition(condition::ChainIsSwinging, index), 0);
-      EXPECT_EQ(host.Condition(condition::OnSwing, index), 0);
-      for (int code : indexed) EXPECT_EQ(host.ActionWithValue(code, index, 12.5f), 0) << "code " << code;
-    }
-    EXPECT_EQ(host.floatParameterCalls, calls + 4 * 5);  // each of the five float setters once per index
-    EXPECT_EQ(ChainBytes(host.extension()), before);
-  }
 }
 
 }  // namespace

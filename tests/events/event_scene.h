@@ -6,8 +6,7 @@
 
 #include <cstdint>
 
-#include "frame/edit_data.h"
-#include "host.h"
+#include "chains/chain_scene.h"
 
 namespace action {
 enum : int {
@@ -43,13 +42,7 @@ class EventTest : public ::testing::Test {
   }
   const ChainRecord& Chain(uint32_t index) { return host.extension().chains->At(index); }
 
-  // The stored defaults: start angle 90, mass 1, gravity 9.81, spacing 0.
-  static EditData Defaults() {
-    EditData settings{};
-    WriteEditDataDefaults(settings);
-    return settings;
-  }
-  standin::Host host{Defaults()};
+  standin::Host host{ChainScene::Defaults()};  // start angle 90, mass 1, gravity 9.81, spacing 0
 
  private:
   int lastId_ = 0;

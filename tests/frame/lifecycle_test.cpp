@@ -1,6 +1,7 @@
 // The entry points the host calls over the object's life, and the records
 // it shares with them: sizes and offsets are asserted at compile time in the
-// headers, these check what the host sees at run time.
+// headers, these check what the host sees at run time, and how a stored
+// setting text reads as a number.
 #include <cmath>
 #include <cstring>
 #include <string>
@@ -12,6 +13,7 @@
 #include "frame/edit_data.h"
 #include "frame/exports.h"
 #include "frame/run_info.h"
+#include "frame/setting_text.h"
 #include "host.h"
 
 namespace {
@@ -64,6 +66,26 @@ TEST(CreateRunObject, ConvertsEachSettingTextForTheChainsToCome) {
     EXPECT_EQ((std::vector<float>{chain.angle, chain.mass, chain.linkSpacing, chain.speed, chain.acceleration}),
               (std::vector<float>{c.values[0], c.values[1], c.values[3], 0.0f, 0.0f}));
     EXPECT_EQ(chain.swinging, 0);
+  }
+}
+
+TEST(SettingText, ReadsTheLongestDecimalPrefixOfItsFieldAndNothingElse) {
+  const struct {
+    const char* text;
+    double value;
+    std::size_t size = 0;  // the field's size; 0: the text and its terminator
+  } cases[] = {
+      // The setting_text fuzzer holds plain decimal texts to the C library;
+      // here, what it cannot: blanks, letters and commas, and each build's
+      // reading of the default and of the ends of the double range.
+      {"9.81", 9.81}, {" 45abc", 45.0}, {"\t\r-2.5x", -2.5}, {"7E-x", 7.0}, {"abc", 0.0}, {"9,81", 9.0},
+      {"0x10", 0.0}, {"inf", 0.0}, {"nan", 0.0}, {"-infinity", 0.0}, {"1e999", INFINITY}, {"1e-999", 0.0},
+      // Ten bytes without a terminator, then what would be the next field.
+      {"123456789077", 1234567890.0, 10},
+  };
+  for (const auto& c : cases) {
+    EXPECT_EQ(ParseDecimalPrefix(c.text, c.size != 0 ? c.size : std::strlen(c.text) + 1), c.value)
+        << '"' << c.text << '"';
   }
 }
 

@@ -1,6 +1,11 @@
 // What authors write to see a scene quickly: several PNG frames from one
 // run, a repeating timeline entry in place of one entry per frame, rules
-// switched on and off, and the warnings about what the library does.
+// switched on and off, and the warnings about what the library does. And the
+// trace of a small scene: the pendulum's arithmetic is the chain tests' to
+// check; here, what the player adds: a fractional angle reaches the library
+// as a float, a rule moves a rider by the platform's DeltaX and DeltaY, which
+// keeps the fractions of its moves, and actions are named by menu and
+// display text.
 #include <gtest/gtest.h>
 
 #include <nlohmann/json.hpp>
@@ -18,13 +23,8 @@ using nlohmann::json;
 // entries.
 std::string Scene(const std::string& extra) {
   return R"({"frames": 12, "canvas": {"width": 200, "height": 120},
-  "objects": [
-    {"name": "anchor", "x": 100, "y": 10, "width": 8, "height": 8},
-    {"name": "link1", "x": 0, "y": 0, "width": 4, "height": 20},
-    {"name": "link2", "x": 0, "y": 0, "width": 4, "height": 20},
-    {"name": "platform", "x": 0, "y": 0, "width": 30, "height": 6},
-    {"name": "rider", "x": 0, "y": 100, "width": 6, "height": 6},
-    {"name": "box", "x": 0, "y": 50, "width": 6, "height": 6}],
+  "objects": )" + Objects({{"anchor", 100, 10, 8, 8}, {"link1", 0, 0, 4, 20}, {"link2", 0, 0, 4, 20},
+                             {"platform", 0, 0, 30, 6}, {"rider", 0, 100, 6, 6}, {"box", 0, 50, 6, 6}}) + R"(,
   "timeline": [
     {"frame": 0, "do": [{"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Link", "params": ["link1"]},
       {"action": "Add Link", "params": ["link2"]}, {"action": "Add Platform", "params": ["platform"]},
@@ -78,10 +78,8 @@ TEST(SceneAuthoringTest, RepeatingEntryPlaysAsTheSameStepsWrittenFrameByFrame) {
 TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
   Folder folder;
   folder.Write("scene.json", R"({"frames": 5, "settings": {"gravity": "9.8x"},
-    "objects": [{"name": "a", "x": 10, "y": 10, "width": 4, "height": 4},
-      {"name": "b", "x": 50, "y": 10, "width": 4, "height": 4},
-      {"name": "l1", "x": 0, "y": 0, "width": 4, "height": 10}, {"name": "l2", "x": 0, "y": 0, "width": 4, "height": 12},
-      {"name": "l3", "x": 0, "y": 0, "width": 4, "height": 10}],
+    "objects": )" + Objects({{"a", 10, 10, 4, 4}, {"b", 50, 10, 4, 4}, {"l1", 0, 0, 4, 10}, {"l2", 0, 0, 4, 12},
+                               {"l3", 0, 0, 4, 10}}) + R"(,
     "timeline": [{"frame": 0, "do": [{"action": "Add Anchor", "params": ["a"]}, {"action": "Add Anchor", "params": ["b"]},
       {"action": "Add Link", "params": ["l1"]}, {"action": "Add Link", "params": ["l2"]},
       {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"}]},
@@ -97,6 +95,54 @@ TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
   const std::vector<std::string> lines = Lines(run.err);
   ASSERT_EQ(lines.size(), expected.size()) << run.err;
   for (std::size_t i = 0; i < lines.size(); ++i) EXPECT_EQ(lines[i].substr(0, expected[i].size()), expected[i]);
+}
+
+// One anchor at (100, 50), three links 32 high, one platform, a rider that an
+// "On Swing" rule moves by the platform's DeltaX and DeltaY. The angle is set
+// to a fraction, so it only survives if it reaches the library as a float.
+const std::string kScene = R"({
+  "settings": {"startAngle": "90", "mass": "1", "gravity": "9.81", "linkSpacing": "0"},
+  "frames": 6,
+  "objects": )" + Objects({{"anchor", 100, 50, 16, 16}, {"link1", 0, 0, 8, 32}, {"link2", 0, 0, 8, 32},
+                             {"link3", 0, 0, 8, 32}, {"platform", 0, 0, 40, 10}, {"rider", 7, -3, 10, 20}}) + R"(,
+  "timeline": [{"frame": 0, "do": [
+    {"action": "Add Anchor", "params": ["anchor"]}, {"action": "Add Link", "params": ["link1"]},
+    {"action": "Add Link  %0", "params": ["link2"]}, {"action": "Add Link", "params": ["link3"]},
+    {"action": "Add Platform", "params": ["platform"]}, {"action": "Set Angle", "params": [0, 30.5]},
+    {"action": "Start Chain", "params": [0]}]}],
+  "onSwing": [{"chain": 0, "do": [{"move": "rider", "by": [
+    {"expression": "DeltaX(", "params": [0]}, {"expression": "DeltaY(", "params": [0]}]}]}]
+})";
+
+TEST(SceneTraceTest, RiderFollowsThePlatformOfAChainOfThreeLinks) {
+  Folder folder;
+  folder.Write("pendulum.json", kScene);
+  const ToolRun run = RunPlayer({"pendulum.json", "--trace", "pendulum.jsonl"}, folder);
+  ASSERT_EQ(run.status, 0) << run.err;
+  EXPECT_EQ(run.err, "");  // no progress when standard error is not a terminal
+
+  const std::vector<std::string> lines = Lines(ReadFile(folder / "pendulum.jsonl"));
+  ASSERT_EQ(lines.size(), 6u);
+  EXPECT_EQ(json::parse(lines[0])["chains"][0]["angle"], 30.5);  // a resting chain's first step keeps it
+  double riderX = 7.0, riderY = -3.0;
+  float previousX = 0.0f, previousY = 0.0f;
+  for (int frame = 0; frame < 6; ++frame) {
+    SCOPED_TRACE("frame " + std::to_string(frame));
+    const json line = json::parse(lines[static_cast<std::size_t>(frame)]);
+    EXPECT_EQ(line["frame"], frame);
+    const json& chain = line["chains"].at(0);
+    const float x = chain["platformX"].get<float>(), y = chain["platformY"].get<float>();
+    // The rule adds the platform's move, a float difference of floats.
+    riderX += static_cast<float>(static_cast<double>(x) - previousX);
+    riderY += static_cast<float>(static_cast<double>(y) - previousY);
+    previousX = x;
+    previousY = y;
+    const json& objects = line["objects"];  // as declared: the platform at 4, the rider at 5
+    EXPECT_EQ(objects[4]["x"], static_cast<int32_t>(x));
+    EXPECT_EQ(objects[5]["x"], static_cast<int32_t>(riderX));
+    EXPECT_EQ(objects[5]["y"], static_cast<int32_t>(riderY));
+  }
+  EXPECT_LT(json::parse(lines[5])["chains"][0]["angle"], 30.5);  // it swings back towards the vertical
 }
 
 }  // namespace

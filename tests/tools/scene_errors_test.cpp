@@ -25,9 +25,8 @@ void PrintTo(const BadInput& input, std::ostream* os) { *os << input.name; }
 
 // A chain of one link; `timeline` and `extra` complete the scene.
 std::string Scene(const std::string& timeline, const std::string& extra = "") {
-  return R"({"frames": 10, "objects": [
-    {"name": "anchor", "x": 100, "y": 40, "width": 16, "height": 16},
-    {"name": "link", "x": 100, "y": 60, "width": 6, "height": 20}], "timeline": )" + timeline + extra + "}";
+  return R"({"frames": 10, "objects": )" + Objects({{"anchor", 100, 40, 16, 16}, {"link", 100, 60, 6, 20}}) +
+         R"(, "timeline": )" + timeline + extra + "}";
 }
 std::string Do(const std::string& actions) { return Scene(R"([{"frame": 0, "do": [)" + actions + "]}]"); }
 

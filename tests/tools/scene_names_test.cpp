@@ -8,6 +8,7 @@
 
 #include <cstring>
 #include <map>
+#include <regex>
 #include <string>
 
 #include "catalogue/catalogue_helpers.h"
@@ -19,26 +20,17 @@ namespace {
 using scene_player::ParamKind;
 
 // Menu texts by event code, from every item of a menu and its submenus.
-void CollectMenuTexts(HMENU menu, int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t), EditorHost& host,
-                      std::map<int, std::string>& texts) {
-  for (int position = 0; position < GetMenuItemCount(menu); ++position) {
-    if (HMENU sub = GetSubMenu(menu, position); sub != nullptr) {
-      CollectMenuTexts(sub, codeFromMenu, host, texts);
-      continue;
-    }
-    char text[256] = "";
-    GetMenuStringA(menu, static_cast<UINT>(position), text, sizeof text, MF_BYPOSITION);
-    texts[codeFromMenu(&host, static_cast<int32_t>(GetMenuItemID(menu, position)))] = text;
-  }
-}
-
 std::map<int, std::string> MenuTexts(HMENU(TVCALL* getMenu)(EditorHost*, void*, void*),
                                      int16_t(TVCALL* codeFromMenu)(EditorHost*, int32_t)) {
   EditorHost host = catalogue_test::HostWithVersion();
-  std::map<int, std::string> texts;
   const HMENU menu = getMenu(&host, nullptr, nullptr);
-  CollectMenuTexts(menu, codeFromMenu, host, texts);
+  const std::string dump = catalogue_test::DumpMenu(menu);  // "text=id|popup{text=id|...}|..."
   DestroyMenu(menu);
+  std::map<int, std::string> texts;
+  const std::regex item(R"(([^|{}=]+)=(\d+))");
+  for (std::sregex_iterator it(dump.begin(), dump.end(), item), end; it != end; ++it) {
+    texts[codeFromMenu(&host, std::stoi((*it)[2]))] = (*it)[1];
+  }
   return texts;
 }
 
@@ -51,41 +43,40 @@ uint16_t EntryWord(const void* entry, int index) {
 
 std::string Text(const char* text) { return text == nullptr ? "<none>" : text; }
 
-TEST(SceneNames, ActionTableMatchesTheCatalogue) {
+TEST(SceneNames, TablesMatchTheCatalogue) {
   EditorHost host = catalogue_test::HostWithVersion();
+  // "menu | display | parameter count" of an entry, as the catalogue and as the player's table say.
+  const auto library = [&](std::map<int, std::string>& menus, int code, const void* entry,
+                           void(TVCALL * display)(EditorHost*, int32_t, char*, int16_t)) {
+    char text[256] = "";
+    display(&host, code, text, sizeof text);
+    return Text(menus.count(code) ? menus[code].c_str() : nullptr) + " | " + text + " | " +
+           std::to_string(EntryWord(entry, 2));
+  };
+  const auto player = [](const auto& name) {
+    return Text(name.menuText) + " | " + name.displayText + " | " + std::to_string(name.paramCount);
+  };
   auto menus = MenuTexts(&GetActionMenu, &GetActionCodeFromMenu);
   for (int code = 0; code < scene_player::kActionNameCount; ++code) {
     const scene_player::ActionName& name = scene_player::kActionNames[code];
     const void* entry = GetActionInfos(&host, code);
     ASSERT_NE(entry, nullptr) << code;
-    char display[256] = "";
-    GetActionString(&host, code, display, sizeof display);
-    std::string library = Text(menus.count(code) ? menus[code].c_str() : nullptr) + " | " + display + " |";
-    std::string player = Text(name.menuText) + " | " + name.displayText + " |";
-    const int count = EntryWord(entry, 2);
-    for (int p = 0; p < count; ++p) {
+    std::string theirs = library(menus, code, entry, &GetActionString), ours = player(name);
+    for (int p = 0; p < EntryWord(entry, 2); ++p) {
       char title[256] = "";
       GetActionTitle(&host, code, static_cast<int16_t>(p), title, sizeof title);
-      library += std::string(" ") + (EntryWord(entry, 3 + p) == 1 ? "object " : "value ") + title;
+      theirs += std::string(" ") + (EntryWord(entry, 3 + p) == 1 ? "object " : "value ") + title;
     }
     for (int p = 0; p < name.paramCount; ++p) {
-      player += std::string(" ") + (name.kinds[p] == ParamKind::Object ? "object " : "value ") + name.titles[p];
+      ours += std::string(" ") + (name.kinds[p] == ParamKind::Object ? "object " : "value ") + name.titles[p];
     }
-    EXPECT_EQ(player, library) << "action " << code;
+    EXPECT_EQ(ours, theirs) << "action " << code;
   }
-}
-
-TEST(SceneNames, ExpressionTableMatchesTheCatalogue) {
-  EditorHost host = catalogue_test::HostWithVersion();
-  auto menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
+  menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
   for (int code = 0; code < scene_player::kExpressionNameCount; ++code) {
-    const scene_player::ExpressionName& name = scene_player::kExpressionNames[code];
     const void* entry = GetExpressionInfos(&host, code);
     ASSERT_NE(entry, nullptr) << code;
-    char display[256] = "";
-    GetExpressionString(&host, code, display, sizeof display);
-    EXPECT_EQ(Text(name.menuText) + " | " + name.displayText + " | " + std::to_string(name.paramCount),
-              menus[code] + " | " + display + " | " + std::to_string(EntryWord(entry, 2)))
+    EXPECT_EQ(player(scene_player::kExpressionNames[code]), library(menus, code, entry, &GetExpressionString))
         << "expression " << code;
   }
 }

@@ -36,8 +36,6 @@ struct OutputCase {
 
 void PrintTo(const OutputCase& c, std::ostream* os) { *os << c.name; }
 
-std::size_t TraceLines(const std::string& text) { return Lines(text).size(); }
-
 const OutputCase kOutputCases[] = {
     {"SceneUnderAnotherName", [](const Folder& f) { fs::create_hard_link(f / "scene.json", f / "other.json"); return -1; },
      {"--trace", "other.json"}, 2, "--trace other.json: this is the scene (scene.json)", nullptr},
@@ -50,7 +48,7 @@ const OutputCase kOutputCases[] = {
      {"--trace", "real/t.jsonl"}, 0, "",
      [](const Folder& f, const ToolRun&, int) {
        EXPECT_TRUE(fs::is_symlink(f / "real/t.jsonl"));
-       EXPECT_EQ(TraceLines(ReadFile(f / "real/x.jsonl")), 3u);
+       EXPECT_EQ(Lines(ReadFile(f / "real/x.jsonl")).size(), 3u);
      }},
     {"Fifo",
      [](const Folder& f) {
@@ -61,7 +59,7 @@ const OutputCase kOutputCases[] = {
      [](const Folder& f, const ToolRun&, int fd) {
        char text[4096];
        const ssize_t length = read(fd, text, sizeof text);
-       EXPECT_EQ(TraceLines(std::string(text, length > 0 ? static_cast<std::size_t>(length) : 0)), 3u);
+       EXPECT_EQ(Lines(std::string(text, length > 0 ? static_cast<std::size_t>(length) : 0)).size(), 3u);
        EXPECT_TRUE(fs::is_fifo(f / "fifo"));
      }},
     // A device made here, never the system's own: a fault could replace it.
@@ -72,7 +70,7 @@ const OutputCase kOutputCases[] = {
      [](const Folder& f, const ToolRun&, int) { EXPECT_TRUE(fs::is_character_file(f / "null")); }},
     {"StandardOutputTwice", nullptr, {"--gif", "-", "--trace", "-"}, 2, "--trace -: standard output is already taken by --gif", nullptr},
     {"StandardOutput", nullptr, {"--trace", "-"}, 0, "-: 3 lines",
-     [](const Folder&, const ToolRun& run, int) { EXPECT_EQ(TraceLines(run.out), 3u); }},
+     [](const Folder&, const ToolRun& run, int) { EXPECT_EQ(Lines(run.out).size(), 3u); }},
     // As root no permission keeps a folder from being written: a folder
     // that is a regular file does.
     {"UnwritableFolder", nullptr, {"--gif", "g.gif", "--trace", "scene.json/t.jsonl"}, 1,

@@ -8,6 +8,8 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <initializer_list>
+#include <iterator>
 #include <sstream>
 #include <stdexcept>
 #include <string>
@@ -17,9 +19,7 @@ namespace tool_test {
 
 inline std::string ReadFile(const std::string& path) {
   std::ifstream file(path, std::ios::binary);
-  std::ostringstream text;
-  text << file.rdbuf();
-  return text.str();
+  return {std::istreambuf_iterator<char>(file), {}};
 }
 
 inline std::vector<std::string> Lines(const std::string& text) {
@@ -27,6 +27,21 @@ inline std::vector<std::string> Lines(const std::string& text) {
   std::istringstream stream(text);
   for (std::string line; std::getline(stream, line);) lines.push_back(line);
   return lines;
+}
+
+// A scene's "objects" array: each object's name, x, y, width and height.
+struct SceneObject {
+  const char* name;
+  int x, y, width, height;
+};
+inline std::string Objects(std::initializer_list<SceneObject> objects) {
+  std::string json;
+  for (const SceneObject& o : objects) {
+    json += std::string(json.empty() ? "[" : ", ") + R"({"name": ")" + o.name + R"(", "x": )" + std::to_string(o.x) +
+            R"(, "y": )" + std::to_string(o.y) + R"(, "width": )" + std::to_string(o.width) + R"(, "height": )" +
+            std::to_string(o.height) + "}";
+  }
+  return json + "]";
 }
 
 // A fresh temporary folder, removed with everything in it at the end.
