@@ -10,6 +10,7 @@
 #include <fstream>
 #include <initializer_list>
 #include <iterator>
+#include <nlohmann/json.hpp>
 #include <sstream>
 #include <stdexcept>
 #include <string>
@@ -35,13 +36,11 @@ struct SceneObject {
   int x, y, width, height;
 };
 inline std::string Objects(std::initializer_list<SceneObject> objects) {
-  std::string json;
+  nlohmann::json list = nlohmann::json::array();
   for (const SceneObject& o : objects) {
-    json += std::string(json.empty() ? "[" : ", ") + R"({"name": ")" + o.name + R"(", "x": )" + std::to_string(o.x) +
-            R"(, "y": )" + std::to_string(o.y) + R"(, "width": )" + std::to_string(o.width) + R"(, "height": )" +
-            std::to_string(o.height) + "}";
+    list.push_back({{"name", o.name}, {"x", o.x}, {"y", o.y}, {"width", o.width}, {"height", o.height}});
   }
-  return json + "]";
+  return list.dump();
 }
 
 // A fresh temporary folder, removed with everything in it at the end.
