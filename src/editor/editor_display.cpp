@@ -19,8 +19,10 @@ namespace {
 // wrapping arithmetic (editor/wrapping_arithmetic.h).
 int32_t Half(int32_t value) { return value / 2; }  // toward zero; never overflows
 
-// A setting text read as the run-time object reads it, truncated toward zero.
-// Beyond the int32 range (a text such as "1e999") it saturates.
+// A setting text parsed as the run-time object parses it (decimal only), then
+// truncated toward zero straight from the double, without the run-time
+// object's rounding to a float. Beyond the int32 range (a text such as
+// "1e999") it saturates.
 int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
   return TruncateToInt(ParseDecimalPrefix(text, kSettingTextSize), 0);
 }
