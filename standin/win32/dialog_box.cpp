@@ -10,7 +10,7 @@
 #include <utility>
 
 #include "dialog_template.h"
-#include "resource_image.h"
+#include "module_resources.h"
 #include "standin_win32.h"
 #include "window_store.h"
 
@@ -153,7 +153,7 @@ void StandinSetDialogAuthor(std::function<void(HWND dialog)> author) { standin::
 
 INT_PTR WINAPI DialogBoxParamA(HINSTANCE hInstance, LPCSTR lpTemplateName, HWND hWndParent, DLGPROC lpDialogFunc,
                                LPARAM dwInitParam) {
-  const standin::ResourceEntry* entry = standin::FindLibraryResource(hInstance, lpTemplateName, RT_DIALOG);
+  const standin::ResourceEntry* entry = standin::FindModuleResource(hInstance, lpTemplateName, RT_DIALOG);
   if (entry == nullptr) return -1;
   // USER32 makes no dialog for an owner that is not a window, and says 0.
   if (hWndParent != nullptr && !IsWindow(hWndParent)) return 0;
