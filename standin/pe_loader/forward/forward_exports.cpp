@@ -56,7 +56,7 @@ void* tavrin_forward_targets[std::size(kNames)];
 [[gnu::destructor]] static void FreeTavrinDll() { PeFreeLibrary(g_module); }
 
 // The module handle under which the DLL's resources are found.
-HINSTANCE TavrinModule() { return static_cast<HINSTANCE>(g_module); }
+[[gnu::visibility("default")]] HINSTANCE TavrinModule() { return static_cast<HINSTANCE>(g_module); }
 
 asm(R"(
     .macro TAVRIN_FORWARD index, name
