@@ -31,7 +31,8 @@ struct Semaphore {
   LONG maximum;
 };
 std::map<HANDLE, std::unique_ptr<Semaphore>>& Semaphores() {
-  static std::map<HANDLE, std::unique_ptr<Semaphore>> semaphores;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& semaphores = *new std::map<HANDLE, std::unique_ptr<Semaphore>>;
   return semaphores;
 }
 

@@ -35,7 +35,8 @@ bool SameName(std::string_view a, std::string_view b) {
 }  // namespace
 
 std::vector<LoadedImage*>& LoadedImages() {
-  static std::vector<LoadedImage*> images;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& images = *new std::vector<LoadedImage*>;
   return images;
 }
 

@@ -32,6 +32,7 @@ constexpr uint16_t kSelector = kLdtEntry << 3 | 4 | 3;  // LDT, ring 3
 
 // The block, then a zeroed process block, then the TLS array.
 uint8_t* g_block = nullptr;
+pid_t g_thread = 0;  // the thread that has it
 
 void Put(uint32_t offset, uint32_t value) { std::memcpy(g_block + offset, &value, 4); }
 uint32_t AddressOf(const void* pointer) { return static_cast<uint32_t>(reinterpret_cast<uintptr_t>(pointer)); }
@@ -39,7 +40,12 @@ uint32_t AddressOf(const void* pointer) { return static_cast<uint32_t>(reinterpr
 }  // namespace
 
 bool EnsureThreadBlock(std::string& error) {
-  if (g_block != nullptr) return true;
+  const auto thread = static_cast<pid_t>(syscall(SYS_gettid));
+  if (g_block != nullptr) {
+    if (thread == g_thread) return true;
+    error = "the loader serves one thread, the one that loaded the first DLL (" + std::to_string(g_thread) + ")";
+    return false;
+  }
   void* pages = mmap(nullptr, 3 * kPage, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
   if (pages == MAP_FAILED) {
     error = std::string("cannot make the thread block: ") + std::strerror(errno);
@@ -60,7 +66,7 @@ bool EnsureThreadBlock(std::string& error) {
   Put(kStackLimit, AddressOf(stackLow));
   Put(kSelf, AddressOf(g_block));
   Put(kProcessId, static_cast<uint32_t>(getpid()));
-  Put(kThreadId, static_cast<uint32_t>(syscall(SYS_gettid)));
+  Put(kThreadId, static_cast<uint32_t>(thread));
   Put(kProcessBlock, AddressOf(g_block + kPage));
   Put(kTlsArray, AddressOf(g_block + 2 * kPage));
 
@@ -77,6 +83,7 @@ bool EnsureThreadBlock(std::string& error) {
     return false;
   }
   asm volatile("movw %w0, %%fs" : : "q"(kSelector));
+  g_thread = thread;
   return true;
 }
 

@@ -19,7 +19,8 @@ namespace standin {
 namespace {
 
 std::unordered_map<uintptr_t, Window>& Windows() {
-  static std::unordered_map<uintptr_t, Window> windows;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& windows = *new std::unordered_map<uintptr_t, Window>;
   return windows;
 }
 

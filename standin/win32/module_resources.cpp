@@ -12,7 +12,8 @@ namespace standin {
 namespace {
 
 std::map<HMODULE, std::vector<ResourceEntry>>& Modules() {
-  static std::map<HMODULE, std::vector<ResourceEntry>> modules;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& modules = *new std::map<HMODULE, std::vector<ResourceEntry>>;
   return modules;
 }
 
