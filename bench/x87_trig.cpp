@@ -48,54 +48,36 @@ F Library(const char* name) {
   return reinterpret_cast<F>(dlsym(RTLD_NEXT, name));
 }
 
-// FSIN, FCOS and FSINCOS leave the operand alone beyond 2^63; the maths
-// library then reduces it by 2 pi with FPREM1 first, as done here.
+// FSIN and FSINCOS leave an operand beyond 2^63 alone and say so in C2; the
+// maths library then reduces it by 2 pi with FPREM1 and tries again, as here.
+#define X87_TRIG(instruction)    \
+  "fldl %[x]\n\t"                \
+  instruction "\n\t"             \
+  "fnstsw %%ax\n\t"              \
+  "testl $0x400, %%eax\n\t"      \
+  "jz 2f\n\t"                    \
+  "fldpi\n\t"                    \
+  "fadd %%st(0), %%st\n\t"       \
+  "fxch %%st(1)\n"                \
+  "1:\n\t"                       \
+  "fprem1\n\t"                   \
+  "fnstsw %%ax\n\t"              \
+  "testl $0x400, %%eax\n\t"      \
+  "jnz 1b\n\t"                   \
+  "fstp %%st(1)\n\t"             \
+  instruction "\n"                \
+  "2:\n\t"
+
 double Fsin(double x) {
   double result;
-  asm("fldl %1\n\t"
-      "fsin\n\t"
-      "fnstsw %%ax\n\t"
-      "testl $0x400, %%eax\n\t"
-      "jz 2f\n\t"
-      "fldpi\n\t"
-      "fadd %%st(0), %%st\n\t"
-      "fxch %%st(1)\n"
-      "1:\n\t"
-      "fprem1\n\t"
-      "fnstsw %%ax\n\t"
-      "testl $0x400, %%eax\n\t"
-      "jnz 1b\n\t"
-      "fstp %%st(1)\n\t"
-      "fsin\n"
-      "2:\n\t"
-      "fstpl %0"
-      : "=m"(result)
-      : "m"(x)
-      : "eax", "st");
+  asm(X87_TRIG("fsin") "fstpl %[sine]" : [sine] "=m"(result) : [x] "m"(x) : "eax", "st");
   return result;
 }
 
 void Fsincos(double x, double* s, double* c) {
-  asm("fldl %2\n\t"
-      "fsincos\n\t"
-      "fnstsw %%ax\n\t"
-      "testl $0x400, %%eax\n\t"
-      "jz 2f\n\t"
-      "fldpi\n\t"
-      "fadd %%st(0), %%st\n\t"
-      "fxch %%st(1)\n"
-      "1:\n\t"
-      "fprem1\n\t"
-      "fnstsw %%ax\n\t"
-      "testl $0x400, %%eax\n\t"
-      "jnz 1b\n\t"
-      "fstp %%st(1)\n\t"
-      "fsincos\n"
-      "2:\n\t"
-      "fstpl %1\n\t"
-      "fstpl %0"
-      : "=m"(*s), "=m"(*c)
-      : "m"(x)
+  asm(X87_TRIG("fsincos") "fstpl %[cosine]\n\tfstpl %[sine]"
+      : [sine] "=m"(*s), [cosine] "=m"(*c)
+      : [x] "m"(x)
       : "eax", "st", "st(1)");
 }
 
