@@ -19,7 +19,6 @@ struct LoadedImage {
   Layout layout;
   std::vector<uint32_t> pageProtections;  // each page's PAGE_* value
   ThreadStorage threadStorage;
-  bool hasThreadStorage = false;
   void* threadData = nullptr;  // this thread's copy of the TLS template
 };
 

@@ -11,7 +11,6 @@
 #include <cstring>
 #include <fstream>
 #include <iterator>
-#include <memory>
 #include <new>
 #include <vector>
 
@@ -59,7 +58,7 @@ int RunEntryPoints(LoadedImage& image, uint32_t reason) {
 
 void Unmap(LoadedImage* image) {
   StandinRemoveModule(reinterpret_cast<HMODULE>(image->base));
-  for (uint32_t index = 0; ThreadStorageSlot(index) != nullptr; ++index) {
+  for (uint32_t index = 0; image->threadData != nullptr && ThreadStorageSlot(index) != nullptr; ++index) {
     if (*ThreadStorageSlot(index) == image->threadData) *ThreadStorageSlot(index) = nullptr;
   }
   std::free(image->threadData);
@@ -177,6 +176,10 @@ void Report(const char* path, const std::string& reason, char* error, size_t siz
 using pe::LoadedImage;
 
 void* PeLoadLibrary(const char* path, char* error, size_t error_size) {
+  if (path == nullptr) {
+    pe::Report("PeLoadLibrary", "no path given", error, error_size);
+    return nullptr;
+  }
   std::string reason;
   LoadedImage* image = nullptr;
   try {
