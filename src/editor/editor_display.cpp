@@ -24,7 +24,7 @@ int32_t Half(int32_t value) { return value / 2; }  // toward zero; never overflo
 // object's rounding to a float. Beyond the int32 range (a text such as
 // "1e999") it saturates.
 int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
-  return TruncateToInt(ParseDecimalPrefix(text, kSettingTextSize), 0);
+  return TruncateToInt(ParseDecimalPrefix(text), 0);
 }
 
 // cx + R cos(angle) or cy + R sin(angle), saturated as above when R is huge.

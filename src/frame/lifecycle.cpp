@@ -16,7 +16,7 @@ namespace {
 HINSTANCE g_module = nullptr;
 
 float SettingValue(const char (&text)[kSettingTextSize]) {
-  return RoundToFloat(ParseDecimalPrefix(text, kSettingTextSize));
+  return RoundToFloat(ParseDecimalPrefix(text));
 }
 
 // A new empty list, or null when memory ran out. The lists are built in
