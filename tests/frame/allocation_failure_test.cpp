@@ -62,46 +62,48 @@ TEST(AllocationFailure, CreationIsRefusedWholeWhenAnyListCannotBeMade) {
   }
 }
 
-// Random appends, removals and lookups against a vector, with a third of the
-// appends and lookups made while memory has run out: a failed append leaves
-// the list as it was, and a lookup without memory for its index still finds
-// the first object of the identifier.
+// Random appends, removals and lookups against a vector, a third of them made
+// while memory has run out, on fresh lists that must grow: a failed append
+// leaves the list as it was, and a lookup without memory for its index still
+// finds the first object of the identifier.
 TEST(AllocationFailure, ListsMatchAVectorWhicheverAllocationsFail) {
   std::vector<HostObject> objects(48);
-  for (std::size_t i = 0; i < objects.size(); ++i) objects[i].head.idLow = static_cast<int16_t>(i % 20);
+  for (std::size_t i = 0; i < objects.size(); ++i) objects[i].head.idLow = static_cast<int16_t>(i % 40);
   std::mt19937 random(7);
-  ObjectList list;
-  std::vector<HostObject*> model;
   int failedAppends = 0;
-  for (int step = 0; step < 4000; ++step) {
-    const bool starved = random() % 3 == 0;
-    const uint32_t pick = random() % objects.size();
-    switch (random() % 4) {
-      case 0:
-        if (!model.empty()) {
-          const uint32_t at = pick % model.size();
-          list.RemoveAt(at);
-          model.erase(model.begin() + at);
-        }
-        break;
-      case 1: {
-        const int32_t id = ObjectIdentifier(objects[pick].head);
-        const auto found = starved ? FailingAfter(0, [&] { return list.Find(id); }) : list.Find(id);
-        uint32_t first = 0;
-        while (first < model.size() && ObjectIdentifier(model[first]->head) != id) ++first;
-        ASSERT_EQ(found.value_or(first), first) << "step " << step;
-        ASSERT_EQ(found.has_value(), first < model.size());
-        break;
-      }
-      default:
-        if (starved ? !FailingAfter(0, [&] { return list.Append(&objects[pick]); }) : !list.Append(&objects[pick])) {
-          ++failedAppends;
+  for (int round = 0; round < 60; ++round) {
+    ObjectList list;
+    std::vector<HostObject*> model;
+    for (uint32_t step = 0, steps = random() % 200; step < steps; ++step) {
+      const bool starved = random() % 3 == 0;
+      const uint32_t pick = random() % objects.size();
+      switch (random() % 4) {
+        case 0:
+          if (!model.empty()) {
+            const uint32_t at = pick % model.size();
+            list.RemoveAt(at);
+            model.erase(model.begin() + at);
+          }
+          break;
+        case 1: {
+          const int32_t id = ObjectIdentifier(objects[pick].head);
+          const auto found = starved ? FailingAfter(0, [&] { return list.Find(id); }) : list.Find(id);
+          uint32_t first = 0;
+          while (first < model.size() && ObjectIdentifier(model[first]->head) != id) ++first;
+          ASSERT_EQ(found.value_or(first), first) << "round " << round << ", step " << step;
+          ASSERT_EQ(found.has_value(), first < model.size());
           break;
         }
-        model.push_back(&objects[pick]);
+        default:
+          if (starved ? !FailingAfter(0, [&] { return list.Append(&objects[pick]); }) : !list.Append(&objects[pick])) {
+            ++failedAppends;
+            break;
+          }
+          model.push_back(&objects[pick]);
+      }
+      ASSERT_EQ(list.Count(), model.size());
+      for (uint32_t i = 0; i < list.Count(); ++i) ASSERT_EQ(list.At(i), model[i]) << "round " << round;
     }
-    ASSERT_EQ(list.Count(), model.size());
-    for (uint32_t i = 0; i < list.Count(); ++i) ASSERT_EQ(list.At(i), model[i]) << "step " << step;
   }
   EXPECT_GT(failedAppends, 0);
 }
