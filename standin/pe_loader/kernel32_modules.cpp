@@ -1,11 +1,8 @@
 // KERNEL32's module and page calls. The modules are the images the loader
-// mapped and the DLLs it stands in for (found as loaded, as on Windows, and
-// offering the functions of their tables); any other DLL is not there. The
+// mapped; any other DLL is not there, and none is looked for on disk. The
 // process's own program answers a null name.
 #include <sys/auxv.h>
 
-
-#include "import_tables.h"
 #include "kernel32_shim.h"
 #include "loaded_images.h"
 
@@ -17,87 +14,41 @@ constexpr DWORD kMemCommit = 0x1000;
 constexpr DWORD kMemImage = 0x1000000;
 constexpr DWORD kPageExecuteWriteCopy = 0x80;
 
-constexpr std::size_t kLongestPath = 260;
-
-// A module name as the A calls take it; false for one longer than a path.
-bool Narrow(LPCWSTR wide, char (&name)[kLongestPath]) {
-  for (std::size_t i = 0; i < kLongestPath; ++i) {
-    name[i] = wide[i] < 0x100 ? static_cast<char>(wide[i]) : '?';
-    if (wide[i] == 0) return true;
-  }
-  return false;
-}
-
-// The handle of a module loaded under `name`, or null.
-HMODULE FindModule(LPCSTR name) {
-  if (LoadedImage* image = ImageNamed(name)) return reinterpret_cast<HMODULE>(image->base);
-  if (const ImportTable* table = FindImportTable(name)) return reinterpret_cast<HMODULE>(const_cast<ImportTable*>(table));
-  return nullptr;
-}
-
-const ImportTable* TableOfHandle(HMODULE module) {
-  for (const char* dll : {"KERNEL32.dll", "USER32.dll", "msvcrt.dll", "DRAVO2.dll"}) {
-    const ImportTable* table = FindImportTable(dll);
-    if (reinterpret_cast<HMODULE>(const_cast<ImportTable*>(table)) == module) return table;
-  }
-  return nullptr;
-}
-
 }  // namespace
 
 HMODULE WINAPI GetModuleHandleA(LPCSTR name) {
   // The program that started the process, never a DLL: the page that holds
   // its program headers.
   if (name == nullptr) return reinterpret_cast<HMODULE>(getauxval(AT_PHDR) & ~uintptr_t{kPageSize - 1});
-  const HMODULE module = FindModule(name);
-  if (module == nullptr) SetLastError(kErrorModNotFound);
-  return module;
+  LoadedImage* image = ImageNamed(name);
+  if (image == nullptr) SetLastError(kErrorModNotFound);
+  return image == nullptr ? nullptr : reinterpret_cast<HMODULE>(image->base);
 }
 
-HMODULE WINAPI GetModuleHandleW(LPCWSTR name) {
-  char narrow[kLongestPath];
-  if (name == nullptr) return GetModuleHandleA(nullptr);
-  if (!Narrow(name, narrow)) {
-    SetLastError(kErrorModNotFound);
-    return nullptr;
-  }
-  return GetModuleHandleA(narrow);
-}
-
-// Only what is loaded already can be loaded: no DLL is looked for on disk.
+// Only what is loaded already can be loaded.
 HMODULE WINAPI LoadLibraryA(LPCSTR name) {
   if (name != nullptr) return GetModuleHandleA(name);
   SetLastError(kErrorInvalidParameter);
   return nullptr;
 }
 
-HMODULE WINAPI LoadLibraryW(LPCWSTR name) {
-  if (name != nullptr) return GetModuleHandleW(name);
-  SetLastError(kErrorInvalidParameter);
-  return nullptr;
-}
-
 // Every module stays loaded until the loader frees it.
 BOOL WINAPI FreeLibrary(HMODULE module) {
-  if (ImageOfHandle(module) != nullptr || TableOfHandle(module) != nullptr) return TRUE;
+  if (ImageOfHandle(module) != nullptr) return TRUE;
   SetLastError(kErrorModNotFound);
   return FALSE;
 }
 
+// Exports by name; an ordinal finds nothing here.
 FARPROC WINAPI GetProcAddress(HMODULE module, LPCSTR name) {
-  void* address = nullptr;
-  if (LoadedImage* image = ImageOfHandle(module)) {
-    const uint32_t rva = IS_INTRESOURCE(name) ? 0 : FindExport({image->base, image->layout.sizeOfImage}, image->layout, name);
-    address = rva == 0 ? nullptr : image->base + rva;
-  } else if (const ImportTable* table = TableOfHandle(module)) {
-    const ImportRow* row = IS_INTRESOURCE(name) ? FindImportRow(*table, {}, LOWORD(name)) : FindImportRow(*table, name, 0);
-    address = row == nullptr ? nullptr : row->address;
-  } else {
+  LoadedImage* image = ImageOfHandle(module);
+  if (image == nullptr) {
     SetLastError(kErrorModNotFound);
     return nullptr;
   }
-  if (address == nullptr) SetLastError(kErrorProcNotFound);
-  return address;
+  const uint32_t rva = IS_INTRESOURCE(name) ? 0 : FindExport({image->base, image->layout.sizeOfImage}, image->layout, name);
+  if (rva == 0) SetLastError(kErrorProcNotFound);
+  return rva == 0 ? nullptr : image->base + rva;
 }
 
 // Pages of a loaded image only; any other address fails.

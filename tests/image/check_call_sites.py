@@ -1,7 +1,9 @@
 #!/usr/bin/env python3
-"""Holds every call of a USER32, KERNEL32 or DRAVO2 import in a DLL to the
-argument bytes the PE loader's import tables give the function (as Windows
-and the host define it), so that a wrong prototype in our own headers shows.
+"""Holds a DLL's imports to the PE loader's import tables: the tables hold
+exactly the functions the DLL imports, and every call of a USER32, KERNEL32
+or DRAVO2 import passes the argument bytes the tables give the function (as
+Windows and the host define it), so that a wrong prototype in our own headers
+shows.
 
 The callee of a __stdcall or __thiscall call removes the arguments, and the
 compiler, which keeps %esp where it wants it, re-adjusts %esp by the bytes it
@@ -18,7 +20,7 @@ import subprocess
 import sys
 
 CHECKED = ("kernel32.dll", "user32.dll", "dravo2.dll")
-ROW = re.compile(r'(Stdcall|Thiscall|Cdecl)<(\d+)>\((?:"(\w+)"|(\d+)),')
+ROW = re.compile(r'(?:Stdcall|Thiscall|Cdecl)<(\d+)>\((?:"(\w+)"|(\d+)),|Data\("(\w+)"')
 
 
 def import_tables(directory):
@@ -30,7 +32,7 @@ def import_tables(directory):
         rows = ROW.findall(files[function].read_text())
         if not rows:
             sys.exit(f"{files[function]}: no rows read")
-        tables[dll.lower()] = {name or int(ordinal): int(size) for _, size, name, ordinal in rows}
+        tables[dll.lower()] = {name or data or int(ordinal): int(size or 0) for size, name, ordinal, data in rows}
     return tables
 
 
@@ -139,7 +141,7 @@ def register_calls(instructions, slots):
                 pass  # padding that changes nothing
             elif written.search(text_j) or text_j.startswith(("ret", "jmp   *", "ud2")):
                 continue
-            if jump := re.fullmatch(r"(j\w+)\s+([0-9a-f]+)( <.*>)?", text_j):
+            if jump := re.fullmatch(r"(j\w+)\s+(?:0x)?([0-9a-f]+)( <.*>)?", text_j):
                 pending.append(where.get(int(jump.group(2), 16), len(instructions)))
                 if jump.group(1) == "jmp":
                     continue
@@ -152,19 +154,26 @@ def register_calls(instructions, slots):
 def main(tool, library, tables_directory):
     tables = import_tables(tables_directory)
     slots, _ = import_slots(pathlib.Path(library).read_bytes())
+    imported = set(slots.values())
+    tabled = {(dll, function) for dll, rows in tables.items() for function in rows}
+    failures = [f"the tables have a row for {dll} {function}, which the DLL does not import"
+                for dll, function in sorted(tabled - imported, key=str)]
+    failures += [f"the DLL imports {dll} {function}, which the tables have no row for"
+                 for dll, function in sorted(imported - tabled, key=str)]
     slots = {address: target for address, target in slots.items() if target[0] in CHECKED}
     rows = frame_rows(tool, library)
     instructions = [(int(m.group(1), 16), m.group(2).strip())
                     for m in re.finditer(r"^ *([0-9a-f]+):\t(.*)$", objdump(tool, library, "-d", "--no-show-raw-insn"), re.M)]
     thunks = {address: slots[int(m.group(1), 16)] for address, text in instructions
               if (m := re.fullmatch(r"jmp\s+\*0x([0-9a-f]+)", text)) and int(m.group(1), 16) in slots}
-    through_registers, failures = register_calls(instructions, slots)
+    through_registers, unused_loads = register_calls(instructions, slots)
+    failures += unused_loads
     sites, unseen = 0, 0
     for i, (address, text) in enumerate(instructions[:-1]):
         targets = set()
         if m := re.fullmatch(r"call\s+\*0x([0-9a-f]+)", text):
             targets = {slots[int(m.group(1), 16)]} if int(m.group(1), 16) in slots else set()
-        elif m := re.fullmatch(r"call\s+([0-9a-f]+)( <.*>)?", text):
+        elif m := re.fullmatch(r"call\s+(?:0x)?([0-9a-f]+)( <.*>)?", text):
             targets = {thunks[int(m.group(1), 16)]} if int(m.group(1), 16) in thunks else set()
         elif i in through_registers:
             targets = through_registers[i]
@@ -174,8 +183,7 @@ def main(tool, library, tables_directory):
             described = f"{dll}!{function}" if isinstance(function, str) else f"{dll} ordinal {function}"
             expected = tables.get(dll, {}).get(function)
             if expected is None:
-                failures.append(f"{address:#x}: calls {described}, which the import tables have no row for")
-                continue
+                continue  # said above
             removed = bytes_after(instructions, i, rows)
             sites += 1
             if removed == "unseen":
@@ -186,8 +194,8 @@ def main(tool, library, tables_directory):
                 failures.append(f"{address:#x}: calls {described} with {removed} bytes of arguments; it takes {expected}")
     if failures:
         sys.exit(f"{library}:\n" + "\n".join(failures))
-    print(f"{sites} calls of USER32, KERNEL32 and DRAVO2 imports pass the bytes the tables give "
-          f"({unseen} of them end their function at once, where the bytes cannot be seen)")
+    print(f"the tables hold exactly the DLL's {len(imported)} imports; {sites} calls of USER32, KERNEL32 and DRAVO2 "
+          f"imports pass the bytes the tables give ({unseen} end their function at once, where the bytes cannot be seen)")
 
 
 if __name__ == "__main__":
