@@ -101,7 +101,7 @@ class DocumentBuilder : public nlohmann::detail::json_sax_dom_parser<json> {
   std::string Place() const {
     std::string place;
     for (const Level& level : levels_) place = level.object ? Member(place, level.key) : Element(place, level.count - 1);
-    return place.empty() ? "top level" : place;
+    return place.empty() ? "top level" : tool_input::Shown(place);
   }
 
   std::vector<std::string>& warnings_;

@@ -43,9 +43,8 @@ PngName::PngName(const std::string& pattern) {
     std::size_t width = Digits(pattern, at);
     if (at < pattern.size() && pattern[at] == '.') width = std::max(width, Digits(pattern, ++at));
     if (at >= pattern.size() || (pattern[at] != 'd' && pattern[at] != 'i') || width > kMaxWidth) {
-      throw tool_input::UsageError("--png " + tool_input::Shown(pattern) + ": " +
-                                   tool_input::Shown(pattern.substr(percent, at + 1 - percent)) +
-                                   " is not a frame number; expected %d, a width such as %05d, or %% for a %");
+      throw tool_input::UsageError("--png " + tool_input::Shown(pattern) +
+                                   ": a % that is no frame number; expected %d, a width such as %05d, or %% for a %");
     }
     ++at;
     pieces_.push_back({pattern.substr(percent, at - percent), true});

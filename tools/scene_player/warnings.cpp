@@ -81,8 +81,8 @@ std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& 
 
   const uint32_t links = LinkCount(rd), chains = ChainCount(rd);
   if (Appears(chains > 0 && links % chains != 0, uneven_)) {
-    warnings.push_back(at + std::to_string(links) + " links do not divide evenly among " + std::to_string(chains) +
-                       " chains: each chain takes " + std::to_string(links / chains) +
+    warnings.push_back(at + std::to_string(links) + (links == 1 ? " link does" : " links do") +
+                       " not divide evenly among " + std::to_string(chains) + " chains: each chain takes " + std::to_string(links / chains) +
                        " in the order they were added, and the last " + std::to_string(links % chains) +
                        " belong to no chain");
   }
