@@ -13,14 +13,12 @@
 #include "preview_options.h"
 #include "preview_warnings.h"
 #include "shown_text.h"
+#include "tool_main.h"
 
 namespace {
 
 using namespace editor_preview;
 using tool_input::Shown;
-
-constexpr int kFailed = 1;
-constexpr int kBadInput = 2;
 
 std::string ViewName(const EditData& settings, bool explained) {
   const std::string view = settings.viewTemplate == 1   ? "the template view"
@@ -88,18 +86,4 @@ int Main(int argc, char** argv) {
 
 }  // namespace
 
-// No exception leaves the tool: bad input ends in one line and status 2, a
-// failure to write in one line and status 1, with no file left behind.
-int main(int argc, char** argv) {
-  try {
-    return Main(argc, argv);
-  } catch (const UsageError& error) {
-    std::cerr << "editor_preview: " << error.what() << '\n';
-    return kBadInput;
-  } catch (const std::exception& error) {
-    std::cerr << "editor_preview: " << error.what() << '\n';
-  } catch (...) {
-    std::cerr << "editor_preview: stopped by an unknown failure\n";
-  }
-  return kFailed;
-}
+int main(int argc, char** argv) { return tool_input::RunToolMain("editor_preview", argc, argv, &Main); }

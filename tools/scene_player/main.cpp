@@ -25,6 +25,7 @@
 #include "png_writer.h"
 #include "scene_parser.h"
 #include "shown_text.h"
+#include "tool_main.h"
 #include "trace_writer.h"
 #include "warnings.h"
 
@@ -33,11 +34,6 @@ namespace {
 using namespace scene_player;
 using namespace tool_output;
 using tool_input::Shown;
-
-// Exit statuses: 0 played and written; 1 a failure while playing or
-// writing; 2 bad input (the command line or the scene).
-constexpr int kFailed = 1;
-constexpr int kBadInput = 2;
 
 // The largest scene read: its document takes several times its text in
 // memory, and no scene within the format's limits needs more.
@@ -151,14 +147,14 @@ int Main(int argc, char** argv) {
 
   const std::string sceneName = options.scene.empty() ? "(embedded demo)" : tool_input::InputName(options.scene);
   const std::optional<std::string> text = SceneText(options, sceneName);
-  if (!text) return kBadInput;
+  if (!text) return tool_input::kBadInput;
   Scene scene;
   std::vector<std::string> readingWarnings;
   try {
     scene = ParseScene(*text, readingWarnings);
   } catch (const SceneError& error) {
     std::cerr << sceneName << ": " << error.place() << ": " << error.what() << '\n';
-    return kBadInput;
+    return tool_input::kBadInput;
   }
 
   Messages messages(sceneName);
@@ -186,19 +182,4 @@ int Main(int argc, char** argv) {
 
 }  // namespace
 
-// No exception leaves the player: bad input ends in one line and status 2; a
-// failure while playing or writing in one line and status 1, after the
-// outputs have been removed.
-int main(int argc, char** argv) {
-  try {
-    return Main(argc, argv);
-  } catch (const UsageError& error) {
-    std::cerr << "scene_player: " << error.what() << '\n';
-    return kBadInput;
-  } catch (const std::exception& error) {
-    std::cerr << "scene_player: " << error.what() << '\n';
-  } catch (...) {
-    std::cerr << "scene_player: stopped by an unknown failure\n";
-  }
-  return kFailed;
-}
+int main(int argc, char** argv) { return tool_input::RunToolMain("scene_player", argc, argv, &Main); }

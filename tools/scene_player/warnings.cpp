@@ -59,7 +59,7 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& rd) 
                               {"linkSpacing", scene.settings.linkSpacing, rd.defaultLinkSpacing}};
   std::vector<std::string> warnings;
   for (const auto& [key, text, stored] : settings) {
-    const std::string start = std::string("settings.") + key + ": the text \"" + text + "\" ";
+    const std::string start = std::string("settings.") + key + ": the text \"" + tool_input::Shown(text) + "\" ";
     if (!IsNumber(text)) {
       warnings.push_back(start + "is not a number; the library reads the number it starts with, here " +
                          Number(stored));
