@@ -169,10 +169,13 @@ class Painter {
     cairo_stroke(cr_);
     cairo_restore(cr_);
   }
-  void Rectangle(int64_t x, int64_t y, int64_t width, int64_t height, Colour colour, bool dashed = false) {
-    cairo_rectangle(cr_, static_cast<double>(x), static_cast<double>(y), static_cast<double>(width),
-                    static_cast<double>(height));
+  void Rectangle(double x, double y, double width, double height, Colour colour, bool dashed = false) {
+    cairo_rectangle(cr_, x, y, width, height);
     Stroke(colour, dashed);
+  }
+  // An object's rectangle, centred on its position as the player draws it.
+  void Centred(const POINT& at, int32_t width, int32_t height, Colour colour) {
+    Rectangle(at.x - width / 2.0, at.y - height / 2.0, width, height, colour);
   }
   // Text at a pixel size whatever the scale, its top-left corner (or the
   // middle of its top) at (x, y) of the editor.
@@ -326,8 +329,8 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
     for (const auto& [degrees, sign] : ends) {
       const double x = cx + arc.radius * std::cos(degrees * kPi / 180);
       const double y = cy + arc.radius * std::sin(degrees * kPi / 180);
-      paint.Text(x, y + std::abs(settings.platformHeight) / 2.0 + 4 / scale,
-                 sign + std::to_string(std::abs(chain.angle)) + " degrees", kArc, true);
+      paint.Text(x, y + std::abs(static_cast<double>(settings.platformHeight)) / 2.0 + 4 / scale,
+                 sign + std::to_string(std::abs(int64_t{chain.angle})) + " degrees", kArc, true);
     }
   }
   if (placesLinks) {
@@ -335,15 +338,11 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
     for (const POINT& link : runTime.links) cairo_line_to(cr.get(), link.x, link.y);
     cairo_line_to(cr.get(), runTime.platform.x, runTime.platform.y);
     paint.Stroke(kRunTime);
-    for (const POINT& link : runTime.links) {
-      paint.Rectangle(link.x - settings.linkWidth / 2, link.y - settings.linkHeight / 2, settings.linkWidth,
-                      settings.linkHeight, kRunTime);
-    }
-    paint.Rectangle(runTime.platform.x - settings.platformWidth / 2, runTime.platform.y - settings.platformHeight / 2,
-                    settings.platformWidth, settings.platformHeight, kRunTime);
+    for (const POINT& link : runTime.links) paint.Centred(link, settings.linkWidth, settings.linkHeight, kRunTime);
+    paint.Centred(runTime.platform, settings.platformWidth, settings.platformHeight, kRunTime);
   }
-  paint.Rectangle(rect.left, rect.top, int64_t{rect.right} - rect.left, int64_t{rect.bottom} - rect.top, kSelection,
-                  true);
+  paint.Rectangle(rect.left, rect.top, static_cast<double>(rect.right) - rect.left,
+                  static_cast<double>(rect.bottom) - rect.top, kSelection, true);
 
   cairo_surface_flush(surface.get());
   const auto write = [](void* closure, const unsigned char* data, unsigned int length) {

@@ -8,8 +8,8 @@
 namespace scene_player {
 
 const char* const kUsage =
-    "usage: scene_player [SCENE.json | -] [--gif FILE] [--png FILE [--png-frame FRAMES]]... [--trace FILE]\n"
-    "                    [--frames N]\n"
+    "usage: scene_player [SCENE.json | -] [--gif FILE] [--png FILE [--png-frame FRAMES]]...\n"
+    "                    [--trace FILE] [--frames N]\n"
     "       scene_player --print-demo | --version | --help\n"
     "Plays SCENE.json (- reads it from standard input), or the embedded demo scene without\n"
     "one, and writes an animated GIF (by default SCENE.gif in the current folder, demo.gif\n"
