@@ -1,6 +1,8 @@
-// What the DRAVO2 stand-in offers beyond the nine drawing services: one
-// editor window to draw on, the record of every service call, and off
-// Windows the picture itself. The library's own code never includes this.
+// The DRAVO2 stand-in: the nine drawing services as the host defines them,
+// declared here and not taken from the library's header, so that a mistake
+// there is not repeated here; and beyond them one editor window to draw on,
+// the record of every service call, and off Windows the picture itself. The
+// library's own code never includes this.
 #pragma once
 
 #include <windows.h>
@@ -15,7 +17,36 @@
 #define DRAVO2_STANDIN_API __attribute__((visibility("default")))
 #endif
 
+// The surface class's operations take the object in ECX on 32-bit x86.
+#if defined(__i386__)
+#define DRAVO2_THISCALL __attribute__((thiscall))
+#else
+#define DRAVO2_THISCALL
+#endif
+
+struct HostSurface;
+
 extern "C" {
+
+// The plain functions, ordinals 34 and 50.
+DRAVO2_STANDIN_API HostSurface* WINAPI HostGetEditorSurface(void* editorWindow, int32_t zero);
+DRAVO2_STANDIN_API void WINAPI HostUpdateEditorRect(void* editorWindow, const RECT* rect);
+// The surface class's operations: 264, 286, 372, 616, 344, 679 and 411.
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceConstruct(HostSurface* self);
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceDestruct(HostSurface* self);
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceCreate(HostSurface* self, int32_t width, int32_t height,
+                                                          HostSurface* model);
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceLoadBitmap(HostSurface* self, HINSTANCE module, int32_t bitmapId,
+                                                              int32_t ownSize);
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceBlit(HostSurface* self, HostSurface* destination, int32_t x,
+                                                        int32_t y, int32_t mode, int32_t a, int32_t b, int32_t c);
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceRectangle(HostSurface* self, int32_t x1, int32_t y1, int32_t x2,
+                                                             int32_t y2, int32_t colour, int32_t a, int32_t b,
+                                                             int32_t thickness);
+DRAVO2_STANDIN_API void DRAVO2_THISCALL HostSurfaceDrawText(HostSurface* self, const char* text, int32_t length,
+                                                            RECT* rect, int32_t a, int32_t b, int32_t c, int32_t d,
+                                                            int32_t e, int32_t f, int32_t g, int32_t h, int32_t i,
+                                                            int32_t flags);
 
 // Opens the editor window (there is one at a time; opening again replaces
 // it) with a white surface of `width` by `height` pixels, each clamped to 1

@@ -1,7 +1,5 @@
 // The nine drawing services of the host's runtime library as the stand-in
 // provides them: every call is recorded, then carried out on a canvas.
-#include "editor/drawing_services.h"
-
 #include <cstring>
 #include <initializer_list>
 #include <new>
@@ -118,36 +116,36 @@ const void* FindBitmap(HINSTANCE module, int32_t id) {
 
 extern "C" {
 
-DRAVO2_STANDIN_API HostSurface* TVCALL HostGetEditorSurface(void* editorWindow, int32_t zero) {
+HostSurface* WINAPI HostGetEditorSurface(void* editorWindow, int32_t zero) {
   Record("GetEditorSurface " + WindowName(editorWindow) + Numbers({zero}));
   return editorWindow != nullptr && editorWindow == g_window ? &g_window->surface : nullptr;
 }
 
-DRAVO2_STANDIN_API void TVCALL HostUpdateEditorRect(void* editorWindow, const RECT* rect) {
+void WINAPI HostUpdateEditorRect(void* editorWindow, const RECT* rect) {
   Record("UpdateEditorRect " + WindowName(editorWindow) + Numbers({rect->left, rect->top, rect->right, rect->bottom}));
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceConstruct(HostSurface* self) {
+void DRAVO2_THISCALL HostSurfaceConstruct(HostSurface* self) {
   new (self) HostSurface;
   g_scratch.insert(self);
   Record("Construct scratch");
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceDestruct(HostSurface* self) {
+void DRAVO2_THISCALL HostSurfaceDestruct(HostSurface* self) {
   Record("Destruct " + SurfaceName(self));
   if (g_scratch.erase(self) == 0) return;
   ReplaceCanvas(self, nullptr);
   self->~HostSurface();
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceCreate(HostSurface* self, int32_t width, int32_t height, HostSurface* model) {
+void DRAVO2_THISCALL HostSurfaceCreate(HostSurface* self, int32_t width, int32_t height, HostSurface* model) {
   Record("Create " + SurfaceName(self) + Numbers({width, height}) + " " + SurfaceName(model));
   if (!IsScratch(self)) return;
   const bool fits = width >= 1 && width <= kLargestSide && height >= 1 && height <= kLargestSide;
   ReplaceCanvas(self, fits ? dravo2::CanvasCreate(width, height, false) : nullptr);
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceLoadBitmap(HostSurface* self, HINSTANCE module, int32_t bitmapId, int32_t ownSize) {
+void DRAVO2_THISCALL HostSurfaceLoadBitmap(HostSurface* self, HINSTANCE module, int32_t bitmapId, int32_t ownSize) {
   Bitmap bitmap;
   const bool found = ReadBitmap(FindBitmap(module, bitmapId), bitmap);
   std::string result = " -> failed";
@@ -164,7 +162,7 @@ DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceLoadBitmap(HostSurface* self, HINS
   }
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceBlit(HostSurface* self, HostSurface* destination, int32_t x, int32_t y, int32_t mode,
+void DRAVO2_THISCALL HostSurfaceBlit(HostSurface* self, HostSurface* destination, int32_t x, int32_t y, int32_t mode,
                                 int32_t a, int32_t b, int32_t c) {
   Record("Blit " + SurfaceName(self) + " " + SurfaceName(destination) + Numbers({x, y, mode, a, b, c}));
   dravo2::Canvas* source = CanvasOf(self);
@@ -172,7 +170,7 @@ DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceBlit(HostSurface* self, HostSurfac
   if (source != nullptr && target != nullptr) dravo2::CanvasBlit(source, target, x, y);
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceRectangle(HostSurface* self, int32_t x1, int32_t y1, int32_t x2, int32_t y2,
+void DRAVO2_THISCALL HostSurfaceRectangle(HostSurface* self, int32_t x1, int32_t y1, int32_t x2, int32_t y2,
                                      int32_t colour, int32_t a, int32_t b, int32_t thickness) {
   Record("Rectangle " + SurfaceName(self) + Numbers({x1, y1, x2, y2, colour, a, b, thickness}));
   if (dravo2::Canvas* canvas = CanvasOf(self)) {
@@ -180,7 +178,7 @@ DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceRectangle(HostSurface* self, int32
   }
 }
 
-DRAVO2_STANDIN_API void TVTHISCALL HostSurfaceDrawText(HostSurface* self, const char* text, int32_t length, RECT* rect, int32_t a,
+void DRAVO2_THISCALL HostSurfaceDrawText(HostSurface* self, const char* text, int32_t length, RECT* rect, int32_t a,
                                     int32_t b, int32_t c, int32_t d, int32_t e, int32_t f, int32_t g, int32_t h,
                                     int32_t i, int32_t flags) {
   // A length of -1 means up to the terminating zero.

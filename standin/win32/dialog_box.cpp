@@ -10,7 +10,7 @@
 #include <utility>
 
 #include "dialog_template.h"
-#include "resource_image.h"
+#include "module_resources.h"
 #include "standin_win32.h"
 #include "window_store.h"
 
@@ -19,7 +19,8 @@ namespace standin {
 namespace {
 
 std::unordered_map<uintptr_t, Window>& Windows() {
-  static std::unordered_map<uintptr_t, Window> windows;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& windows = *new std::unordered_map<uintptr_t, Window>;
   return windows;
 }
 
@@ -153,7 +154,7 @@ void StandinSetDialogAuthor(std::function<void(HWND dialog)> author) { standin::
 
 INT_PTR WINAPI DialogBoxParamA(HINSTANCE hInstance, LPCSTR lpTemplateName, HWND hWndParent, DLGPROC lpDialogFunc,
                                LPARAM dwInitParam) {
-  const standin::ResourceEntry* entry = standin::FindLibraryResource(hInstance, lpTemplateName, RT_DIALOG);
+  const standin::ResourceEntry* entry = standin::FindModuleResource(hInstance, lpTemplateName, RT_DIALOG);
   if (entry == nullptr) return -1;
   // USER32 makes no dialog for an owner that is not a window, and says 0.
   if (hWndParent != nullptr && !IsWindow(hWndParent)) return 0;

@@ -1,6 +1,6 @@
 #include "dialog_template.h"
 
-#include "resource_image.h"
+#include "module_resources.h"
 
 namespace standin {
 

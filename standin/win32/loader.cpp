@@ -1,9 +1,13 @@
 // Plays the system loader's part for the library off Windows: once the
-// library is in memory, its entry point is called with the module handle
-// under which its resources are found.
-#include "standin_win32.h"
+// library is in memory, its embedded resources are made its module's, and
+// its entry point is called with that module's handle.
+#include "module_resources.h"
 
 extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved);
+
+// Generated at build time from the library's .res file.
+extern const unsigned char kLibraryResources[];
+extern const std::size_t kLibraryResourcesSize;
 
 namespace {
 
@@ -12,7 +16,11 @@ namespace {
 char g_moduleTag;
 
 struct LoadLibrary {
-  LoadLibrary() { DllMain(reinterpret_cast<HINSTANCE>(&g_moduleTag), DLL_PROCESS_ATTACH, nullptr); }
+  LoadLibrary() {
+    const HMODULE module = reinterpret_cast<HINSTANCE>(&g_moduleTag);
+    StandinAddModule(module, standin::ReadResFile(kLibraryResources, kLibraryResourcesSize));
+    DllMain(module, DLL_PROCESS_ATTACH, nullptr);
+  }
 } g_load;
 
 }  // namespace

@@ -11,7 +11,8 @@
 namespace {
 
 std::unordered_set<void*>& LiveBlocks() {
-  static std::unordered_set<void*> blocks;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& blocks = *new std::unordered_set<void*>;
   return blocks;
 }
 

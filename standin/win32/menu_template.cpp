@@ -6,7 +6,7 @@
 #include <new>
 
 #include "menu_store.h"
-#include "resource_image.h"
+#include "module_resources.h"
 
 namespace {
 
@@ -65,7 +65,7 @@ bool ParseItems(const Template& t, std::size_t& offset, HMENU menu) {
 }  // namespace
 
 HMENU WINAPI LoadMenuA(HINSTANCE hInstance, LPCSTR lpMenuName) {
-  const standin::ResourceEntry* entry = standin::FindLibraryResource(hInstance, lpMenuName, RT_MENU);
+  const standin::ResourceEntry* entry = standin::FindModuleResource(hInstance, lpMenuName, RT_MENU);
   if (entry == nullptr) return nullptr;
   const Template t{entry->data, entry->size};
   std::size_t offset = 0;

@@ -16,7 +16,8 @@ namespace standin {
 namespace {
 
 std::unordered_map<uintptr_t, Menu>& Menus() {
-  static std::unordered_map<uintptr_t, Menu> menus;
+  // Never destroyed: a loaded DLL shutting down at exit still calls in.
+  static auto& menus = *new std::unordered_map<uintptr_t, Menu>;
   return menus;
 }
 

@@ -4,7 +4,7 @@
 // characters (length 0 for an id that has no string).
 #include <algorithm>
 
-#include "resource_image.h"
+#include "module_resources.h"
 
 int WINAPI LoadStringA(HINSTANCE hInstance, UINT uID, LPSTR lpBuffer, int cchBufferMax) {
   // A size of 0 asks Windows for a pointer to the resource text rather
@@ -12,7 +12,7 @@ int WINAPI LoadStringA(HINSTANCE hInstance, UINT uID, LPSTR lpBuffer, int cchBuf
   if (lpBuffer == nullptr || cchBufferMax <= 0) return 0;
   lpBuffer[0] = '\0';
 
-  const standin::ResourceEntry* block = standin::FindLibraryResource(
+  const standin::ResourceEntry* block = standin::FindModuleResource(
       hInstance, MAKEINTRESOURCEA((LOWORD(uID) >> 4) + 1), RT_STRING);
   if (block == nullptr) return 0;
 

@@ -14,7 +14,6 @@
 
 #include "catalogue/catalogue_helpers.h"
 #include "dialog_author.h"
-#include "editor/setup_dialog.h"
 #include "frame/edit_data.h"
 #include "frame/exports.h"
 #include "frame/module.h"
@@ -249,15 +248,16 @@ TEST(DialogCalls, ItemsAnswerAsUser32Does) {
   });
 }
 
+// The procedure of a dialog that must never show.
+INT_PTR CALLBACK NeverShown(HWND, UINT, WPARAM, LPARAM) { return 0; }
+
 TEST(DialogCalls, DialogThatCannotBeShownAnswersAsUser32Does) {
   EditData edit{};
-  SetupDialogContext context{&edit, nullptr};
-  const auto param = reinterpret_cast<LPARAM>(&context);
   const int shown = editor_test::WithAuthor([](HWND dialog) { editor_test::Click(dialog, IDCANCEL); }, [&] {
-    EXPECT_EQ(DialogBoxParamA(TavrinModule(), MAKEINTRESOURCEA(IDD_SETUP + 1), nullptr, SetupDialogProc, param), -1);
+    EXPECT_EQ(DialogBoxParamA(TavrinModule(), MAKEINTRESOURCEA(IDD_SETUP + 1), nullptr, NeverShown, 0), -1);
     // An owner that is not a window: no dialog, and 0.
     const auto stale = reinterpret_cast<HWND>(static_cast<uintptr_t>(0x7FFF0));
-    EXPECT_EQ(DialogBoxParamA(TavrinModule(), MAKEINTRESOURCEA(IDD_SETUP), stale, SetupDialogProc, param), 0);
+    EXPECT_EQ(DialogBoxParamA(TavrinModule(), MAKEINTRESOURCEA(IDD_SETUP), stale, NeverShown, 0), 0);
     // The routines do not take that 0 for OK: nothing shown, nothing stored.
     EditorHost host = catalogue_test::HostWithVersion();
     host.slot[kEditorSlotOwnerWindow] = stale;

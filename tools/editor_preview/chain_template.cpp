@@ -12,7 +12,7 @@ namespace {
 
 // As the editor display reads a setting text: its number, truncated.
 int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
-  return TruncateToInt(ParseDecimalPrefix(text, kSettingTextSize), 0);
+  return TruncateToInt(ParseDecimalPrefix(text), 0);
 }
 
 }  // namespace

@@ -249,7 +249,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
     caption.push_back({"green: the arc the platform travels, drawn at -" + std::to_string(chain.angle) + ", 0 and +" +
                            std::to_string(chain.angle) + " degrees; positive angles swing to the left (smaller x)",
                        kArc});
-    const double startAngle = ParseDecimalPrefix(settings.startAngleText, kSettingTextSize);
+    const double startAngle = ParseDecimalPrefix(settings.startAngleText);
     caption.push_back({placesLinks ? "orange: the links and the platform as the run-time step places them at the "
                                      "starting angle, " + Degrees(static_cast<float>(startAngle)) + " degrees"
                                    : "the links are not placed: more than " + std::to_string(kMostLinks),

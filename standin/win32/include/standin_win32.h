@@ -1,16 +1,45 @@
-// What the Win32 stand-in offers beyond the Win32 calls: the module handle
-// under which the library's resources are found, hooks through which tests
-// make allocations fail and count what is still alive, and the author who
-// works the dialogs. The library's
-// own code never includes this header.
+// What the Win32 stand-in offers beyond the Win32 calls: the modules whose
+// resources the resource calls read, hooks through which tests make
+// allocations fail and count what is still alive, and the author who works
+// the dialogs. The library's own code never includes this header.
 #pragma once
 
 #include <windows.h>
 
 #include <cstddef>
+#include <cstdint>
 #include <functional>
+#include <string>
+#include <vector>
 
-// The library's module instance handle (the one DllMain received).
+namespace standin {
+
+// A resource type or name: an integer id, or a text kept in upper case as
+// the resource compiler stores it.
+struct ResourceKey {
+  uint16_t id = 0;
+  std::u16string text;  // empty for an id
+};
+
+struct ResourceEntry {
+  ResourceKey type;
+  ResourceKey name;
+  uint16_t language = 0;
+  const unsigned char* data = nullptr;
+  uint32_t size = 0;
+};
+
+}  // namespace standin
+
+// Makes `resources` what FindResourceA, LoadStringA, LoadMenuA and
+// DialogBoxParamA find under `module`, replacing any it had. Their data must
+// stay in place until the module is removed. False when memory runs out.
+bool StandinAddModule(HMODULE module, std::vector<standin::ResourceEntry> resources);
+// The module's resources are gone, and so are its HRSRC handles.
+void StandinRemoveModule(HMODULE module);
+
+// The library's module instance handle (the one DllMain received) when the
+// library and this stand-in are built into one program.
 HINSTANCE StandinLibraryModule();
 
 // After `successes` more calls succeed, the next `failures` calls of
