@@ -25,7 +25,7 @@ using Author = std::function<void(HWND dialog)>;
 constexpr INT_PTR kLeftOpen = 12345;
 
 inline std::string ReadText(HWND dialog, int id) {
-  char text[256] = "";
+  char text[2048] = "";
   GetDlgItemTextA(dialog, id, text, sizeof text);
   return text;
 }
@@ -45,34 +45,60 @@ namespace detail {
 
 inline Author g_author;
 inline int g_dialogsShown = 0;
+inline Author g_boxAuthor;
+inline int g_boxesShown = 0;
+inline HWND g_owner = nullptr;  // of the dialog the next timer looks for
 
-inline void Act(HWND dialog) {
-  ++g_dialogsShown;
-  g_author(dialog);
+// `author` at a dialog that is up, which it must close.
+inline void ActIn(HWND dialog, const Author& author, int& shown) {
+  ++shown;
+  author(dialog);
   if (IsWindowVisible(dialog)) {
     ADD_FAILURE() << "the author left the dialog open";
     EndDialog(dialog, kLeftOpen);
   }
 }
+inline void Act(HWND dialog) { ActIn(dialog, g_author, g_dialogsShown); }
+inline void ActInBox(HWND box) { ActIn(box, g_boxAuthor, g_boxesShown); }
 
 #if defined(_WIN32)
 inline BOOL CALLBACK FindDialog(HWND window, LPARAM found) {
   char name[16] = "";
   GetClassNameA(window, name, sizeof name);
-  if (std::string(name) != "#32770" || !IsWindowVisible(window)) return TRUE;
+  if (std::string(name) != "#32770" || !IsWindowVisible(window) || GetWindow(window, GW_OWNER) != g_owner) {
+    return TRUE;
+  }
   *reinterpret_cast<HWND*>(found) = window;
   return FALSE;
 }
-// The modal loop dispatches the thread's timer: once the dialog is shown,
-// the author takes over.
+// A modal loop dispatches the thread's timers: once a dialog that g_owner
+// owns is shown, `act` takes over.
+template <void (*act)(HWND)>
 inline void CALLBACK OnTimer(HWND, UINT, UINT_PTR timer, DWORD) {
   HWND dialog = nullptr;
   EnumThreadWindows(GetCurrentThreadId(), FindDialog, reinterpret_cast<LPARAM>(&dialog));
   if (dialog == nullptr) return;
   KillTimer(nullptr, timer);
-  Act(dialog);
+  act(dialog);
 }
 #endif
+
+// Makes the call `open`, which shows a modal dialog owned by `owner`, and
+// has `act` work it once it is up.
+template <void (*act)(HWND)>
+inline void Run(HWND owner, const std::function<void()>& open) {
+#if defined(_WIN32)
+  g_owner = owner;
+  const UINT_PTR timer = SetTimer(nullptr, 0, 10, OnTimer<act>);
+  open();
+  KillTimer(nullptr, timer);
+#else
+  (void)owner;
+  StandinSetDialogAuthor(act);
+  open();
+  StandinSetDialogAuthor(nullptr);
+#endif
+}
 
 }  // namespace detail
 
@@ -81,16 +107,20 @@ inline void CALLBACK OnTimer(HWND, UINT, UINT_PTR timer, DWORD) {
 inline int WithAuthor(Author author, const std::function<void()>& open) {
   detail::g_author = std::move(author);
   detail::g_dialogsShown = 0;
-#if defined(_WIN32)
-  const UINT_PTR timer = SetTimer(nullptr, 0, 10, detail::OnTimer);
-  open();
-  KillTimer(nullptr, timer);
-#else
-  StandinSetDialogAuthor(detail::Act);
-  open();
-  StandinSetDialogAuthor(nullptr);
-#endif
+  detail::Run<detail::Act>(nullptr, open);
   return detail::g_dialogsShown;
+}
+
+// Clicks button `id` of `dialog`, with `answer` at the message box that the
+// click shows, owned by the dialog; the number of boxes shown.
+inline int ClickIntoMessageBox(HWND dialog, int id, Author answer) {
+  detail::g_boxAuthor = std::move(answer);
+  detail::g_boxesShown = 0;
+  detail::Run<detail::ActInBox>(dialog, [&] { Click(dialog, id); });
+#if !defined(_WIN32)
+  StandinSetDialogAuthor(detail::Act);  // back to the dialog's author
+#endif
+  return detail::g_boxesShown;
 }
 
 }  // namespace editor_test

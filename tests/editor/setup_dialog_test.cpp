@@ -78,14 +78,45 @@ struct Press {
 constexpr Press kOk{false, IDOK}, kEnter{true, VK_RETURN}, kCancel{false, IDCANCEL}, kEscape{true, VK_ESCAPE},
     kHelp{false, IDC_SETUP_HELP};
 
+std::string Loaded(UINT id) {
+  char text[2048] = "";
+  LoadStringA(TavrinModule(), id, text, sizeof text);
+  return text;
+}
+
+// Clicks "Help": a message box that the dialog owns, and that keeps the
+// dialog disabled until its OK is pressed. Its caption and text.
+std::string ReadHelp(HWND dialog) {
+  std::string help;
+  const int boxes = editor_test::ClickIntoMessageBox(dialog, IDC_SETUP_HELP, [&](HWND box) {
+    char caption[64] = "";
+    GetWindowTextA(box, caption, sizeof caption);
+    help = caption + std::string(" | ") + ReadText(box, 0xFFFF);
+    EXPECT_EQ(GetWindow(box, GW_OWNER), dialog);
+    EXPECT_FALSE(IsWindowEnabled(dialog));
+    editor_test::Click(box, IDOK);
+  });
+  EXPECT_EQ(boxes, 1);
+  EXPECT_TRUE(IsWindowEnabled(dialog));
+  return help;
+}
+
 // The author reads what is shown, then presses each of `presses` in turn;
-// every press but the last leaves the dialog open.
+// every press but the last leaves the dialog open. "Help" is read and
+// closed.
 editor_test::Author ReadThenPress(std::string& shown, std::vector<Press> presses) {
   return [&shown, presses](HWND dialog) {
     shown = Shown(dialog);
     for (std::size_t i = 0; i < presses.size(); ++i) {
       const Press& p = presses[i];
-      p.key ? editor_test::PressKey(dialog, static_cast<WPARAM>(p.code)) : editor_test::Click(dialog, p.code);
+      if (!p.key && p.code == IDC_SETUP_HELP) {
+        const std::string help = ReadHelp(dialog);
+        EXPECT_EQ(help, Loaded(IDS_SETUP_HELP_CAPTION) + " | " + Loaded(IDS_SETUP_HELP_TEXT));
+        EXPECT_NE(help.find("guide.html"), std::string::npos) << help;
+        EXPECT_EQ(Shown(dialog), shown);
+      } else {
+        p.key ? editor_test::PressKey(dialog, static_cast<WPARAM>(p.code)) : editor_test::Click(dialog, p.code);
+      }
       if (i + 1 < presses.size()) {
         EXPECT_TRUE(IsWindowVisible(dialog)) << "press " << i;
       }
@@ -127,13 +158,16 @@ TEST(SetupDialog, ShowsTheSettingsAndKeepsThemWhateverEndsIt) {
   }
 }
 
+// A value of its own in every field, so that two controls swapped show.
 TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   EditorHost host = catalogue_test::HostWithVersion();
   EditData edit = FreshRecord();
   const auto typeAndOk = [](HWND dialog) {
     const std::pair<int, const char*> typed[] = {
-        {IDC_MASS, "123456789012"}, {IDC_START_ANGLE, "45"}, {IDC_ANCHOR_WIDTH, "abc"},
-        {IDC_PLATFORM_HEIGHT, ""},  {IDC_LINK_COUNT, "-5"}};
+        {IDC_MASS, "123456789012"}, {IDC_START_ANGLE, "45"},       {IDC_LINK_SPACING, "2.5"},
+        {IDC_GRAVITY, "9,81"},      {IDC_ANCHOR_WIDTH, "abc"},     {IDC_ANCHOR_HEIGHT, "41"},
+        {IDC_LINK_WIDTH, "7"},      {IDC_LINK_HEIGHT, "9"},        {IDC_PLATFORM_WIDTH, "80"},
+        {IDC_PLATFORM_HEIGHT, "12"}, {IDC_LINK_COUNT, "-5"}};
     for (const auto& [id, text] : typed) editor_test::Type(dialog, id, text);
     editor_test::Click(dialog, IDC_VIEW_TEMPLATE);
     editor_test::Click(dialog, IDOK);
@@ -145,8 +179,14 @@ TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   EditData expected = Defaults();
   SetText(expected.massText, "123456789");  // twelve digits cut to nine
   SetText(expected.startAngleText, "45");
+  SetText(expected.linkSpacingText, "2.5");
+  SetText(expected.gravityText, "9,81");  // stored as typed; the run-time object reads 9
   expected.anchorWidth = 0;  // letters
-  expected.platformHeight = 0;  // empty
+  expected.anchorHeight = 41;
+  expected.linkWidth = 7;
+  expected.linkHeight = 9;
+  expected.platformWidth = 80;
+  expected.platformHeight = 12;
   expected.linkCount = -5;
   expected.viewTemplate = 1;
   EXPECT_TRUE(SameBytes(edit, expected));
@@ -158,8 +198,8 @@ TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   EXPECT_EQ(WithAuthor(ReadThenPress(shown, {kCancel}),
                        [&] { result = SelectPopup(&host, 2020, nullptr, nullptr, &edit, nullptr, nullptr); }),
             1);
-  EXPECT_EQ(shown, "1001=45 1002=123456789 1003=yyyyyyyyyy 1004=9.81 1005=64 1006=0 1007=32 1008=32 1009=0 "
-                   "1010=32 1011=-5 box=1");
+  EXPECT_EQ(shown, "1001=45 1002=123456789 1003=yyyyyyyyyy 1004=9,81 1005=80 1006=12 1007=7 1008=9 1009=0 "
+                   "1010=41 1011=-5 box=1");
   EXPECT_EQ(result, 0);
   EXPECT_TRUE(SameBytes(edit, before));
 }
