@@ -2,11 +2,15 @@
 // The player keeps its own table of them, so that stored scenes keep their
 // meaning; this test holds that table to what the library's catalogue says
 // (menu texts, display strings, parameter counts, object parameters and
-// titles), so a changed text in the resources cannot pass unnoticed.
+// titles), so a changed text in the resources cannot pass unnoticed. The
+// author's guide is held to the catalogue too, so that no event an author
+// can pick goes undescribed.
 #include <gtest/gtest.h>
 #include <windows.h>
 
 #include <cstring>
+#include <fstream>
+#include <iterator>
 #include <map>
 #include <regex>
 #include <string>
@@ -79,6 +83,35 @@ TEST(SceneNames, TablesMatchTheCatalogue) {
     EXPECT_EQ(player(scene_player::kExpressionNames[code]), library(menus, code, entry, &GetExpressionString))
         << "expression " << code;
   }
+}
+
+// Each item of the three menus has a section of the guide headed by its menu
+// text, which shows its display text.
+TEST(Guide, DescribesEveryEventOfTheMenus) {
+  std::ifstream file(GUIDE_DOC);
+  const std::string guide{std::istreambuf_iterator<char>(file), {}};
+  EditorHost host = catalogue_test::HostWithVersion();
+  const struct {
+    HMENU(TVCALL* menu)(EditorHost*, void*, void*);
+    int16_t(TVCALL* code)(EditorHost*, int32_t);
+    void(TVCALL* display)(EditorHost*, int32_t, char*, int16_t);
+  } families[] = {{&GetConditionMenu, &GetConditionCodeFromMenu, &GetConditionString},
+                  {&GetActionMenu, &GetActionCodeFromMenu, &GetActionString},
+                  {&GetExpressionMenu, &GetExpressionCodeFromMenu, &GetExpressionString}};
+  std::size_t described = 0;
+  for (const auto& family : families) {
+    for (const auto& [code, text] : MenuTexts(family.menu, family.code)) {
+      const std::string heading = "\n#### " + text.substr(0, text.find_last_not_of(' ') + 1) + "\n";
+      const std::size_t start = guide.find(heading);
+      ASSERT_NE(start, std::string::npos) << "no section" << heading;
+      const std::string section = guide.substr(start, guide.find("\n#", start + heading.size()) - start);
+      char display[256] = "";
+      family.display(&host, code, display, sizeof display);
+      EXPECT_NE(section.find("`" + std::string(display) + "`"), std::string::npos) << heading << display;
+      ++described;
+    }
+  }
+  EXPECT_EQ(described, 2u + 15u + 17u);  // every item of the three menus
 }
 
 }  // namespace
