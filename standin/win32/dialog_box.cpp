@@ -172,7 +172,9 @@ using standin::FindWindowOf;
 using standin::Window;
 using standin::WindowKind;
 
-void StandinSetDialogAuthor(std::function<void(HWND dialog)> author) { standin::g_author = std::move(author); }
+std::function<void(HWND dialog)> StandinSetDialogAuthor(std::function<void(HWND dialog)> author) {
+  return std::exchange(standin::g_author, std::move(author));
+}
 
 INT_PTR WINAPI DialogBoxParamA(HINSTANCE hInstance, LPCSTR lpTemplateName, HWND hWndParent, DLGPROC lpDialogFunc,
                                LPARAM dwInitParam) {

@@ -43,61 +43,59 @@ inline void PressKey(HWND dialog, WPARAM key) {
 
 namespace detail {
 
-inline Author g_author;
-inline int g_dialogsShown = 0;
-inline Author g_boxAuthor;
-inline int g_boxesShown = 0;
-inline HWND g_owner = nullptr;  // of the dialog the next timer looks for
+// Who acts at the dialogs a call shows, and how many came up.
+struct Hand {
+  Author author;
+  int shown = 0;
+};
+inline Hand g_atDialog, g_atBox;
 
-// `author` at a dialog that is up, which it must close.
-inline void ActIn(HWND dialog, const Author& author, int& shown) {
-  ++shown;
-  author(dialog);
+template <Hand& hand>
+inline void Act(HWND dialog) {
+  ++hand.shown;
+  hand.author(dialog);
   if (IsWindowVisible(dialog)) {
     ADD_FAILURE() << "the author left the dialog open";
     EndDialog(dialog, kLeftOpen);
   }
 }
-inline void Act(HWND dialog) { ActIn(dialog, g_author, g_dialogsShown); }
-inline void ActInBox(HWND box) { ActIn(box, g_boxAuthor, g_boxesShown); }
 
 #if defined(_WIN32)
 inline BOOL CALLBACK FindDialog(HWND window, LPARAM found) {
   char name[16] = "";
   GetClassNameA(window, name, sizeof name);
-  if (std::string(name) != "#32770" || !IsWindowVisible(window) || GetWindow(window, GW_OWNER) != g_owner) {
-    return TRUE;
-  }
+  if (std::string(name) != "#32770" || !IsWindowVisible(window)) return TRUE;
   *reinterpret_cast<HWND*>(found) = window;
   return FALSE;
 }
-// A modal loop dispatches the thread's timers: once a dialog that g_owner
-// owns is shown, `act` takes over.
-template <void (*act)(HWND)>
+// The modal loop dispatches the thread's timer: once the dialog is shown,
+// the author takes over. Windows are found from the top, and an owned
+// window lies above its owner: a message box comes before its dialog.
+template <Hand& hand>
 inline void CALLBACK OnTimer(HWND, UINT, UINT_PTR timer, DWORD) {
   HWND dialog = nullptr;
   EnumThreadWindows(GetCurrentThreadId(), FindDialog, reinterpret_cast<LPARAM>(&dialog));
   if (dialog == nullptr) return;
   KillTimer(nullptr, timer);
-  act(dialog);
+  Act<hand>(dialog);
 }
 #endif
 
-// Makes the call `open`, which shows a modal dialog owned by `owner`, and
-// has `act` work it once it is up.
-template <void (*act)(HWND)>
-inline void Run(HWND owner, const std::function<void()>& open) {
+// Makes the call `open`, with `author` at each dialog it shows; the number
+// of dialogs shown.
+template <Hand& hand>
+inline int Run(Author author, const std::function<void()>& open) {
+  hand = Hand{std::move(author), 0};
 #if defined(_WIN32)
-  g_owner = owner;
-  const UINT_PTR timer = SetTimer(nullptr, 0, 10, OnTimer<act>);
+  const UINT_PTR timer = SetTimer(nullptr, 0, 10, OnTimer<hand>);
   open();
   KillTimer(nullptr, timer);
 #else
-  (void)owner;
-  StandinSetDialogAuthor(act);
+  auto before = StandinSetDialogAuthor(Act<hand>);
   open();
-  StandinSetDialogAuthor(nullptr);
+  StandinSetDialogAuthor(std::move(before));
 #endif
+  return hand.shown;
 }
 
 }  // namespace detail
@@ -105,22 +103,13 @@ inline void Run(HWND owner, const std::function<void()>& open) {
 // Makes the call `open`, with `author` at each dialog it shows; the number
 // of dialogs shown.
 inline int WithAuthor(Author author, const std::function<void()>& open) {
-  detail::g_author = std::move(author);
-  detail::g_dialogsShown = 0;
-  detail::Run<detail::Act>(nullptr, open);
-  return detail::g_dialogsShown;
+  return detail::Run<detail::g_atDialog>(std::move(author), open);
 }
 
 // Clicks button `id` of `dialog`, with `answer` at the message box that the
-// click shows, owned by the dialog; the number of boxes shown.
+// click shows; the number of boxes shown.
 inline int ClickIntoMessageBox(HWND dialog, int id, Author answer) {
-  detail::g_boxAuthor = std::move(answer);
-  detail::g_boxesShown = 0;
-  detail::Run<detail::ActInBox>(dialog, [&] { Click(dialog, id); });
-#if !defined(_WIN32)
-  StandinSetDialogAuthor(detail::Act);  // back to the dialog's author
-#endif
-  return detail::g_boxesShown;
+  return detail::Run<detail::g_atBox>(std::move(answer), [&] { Click(dialog, id); });
 }
 
 }  // namespace editor_test
