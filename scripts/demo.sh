@@ -23,6 +23,7 @@ build/release/tools/scene_player/scene_player --gif out/demo.gif
 step "rendering the editor's template view into out/editor-preview.png"
 build/release/tools/editor_preview/editor_preview --view-template 1 --left 40 out/editor-preview.png
 echo "tavrin.dll (for the host):  $(pwd)/build/mingw-i686/tavrin.dll"
+echo "its debug information:      $(pwd)/build/mingw-i686/tavrin.dll.debug"
 echo "libtavrin.so (native):      $(pwd)/build/release/libtavrin.so"
 echo "the demo, played:           $(pwd)/out/demo.gif"
 echo "the editor's template view: $(pwd)/out/editor-preview.png"

@@ -1,7 +1,5 @@
 #include "chains/identifier_index.h"
 
-#include <new>
-
 // Fibonacci hashing: the top bits of the identifier times 2^64 / phi. Spreads
 // the consecutive identifiers that hosts hand out over the whole table.
 std::size_t IdentifierIndex::Home(int32_t id) const {
@@ -10,8 +8,8 @@ std::size_t IdentifierIndex::Home(int32_t id) const {
 }
 
 bool IdentifierIndex::Insert(int32_t id, uint32_t position) noexcept {
-  if ((used_ + 1) * 2 > slots_.size() && !Grow()) return false;
-  const std::size_t mask = slots_.size() - 1;
+  if ((used_ + 1) * 2 > slots_.Count() && !Grow()) return false;
+  const std::size_t mask = slots_.Count() - 1;
   for (std::size_t s = Home(id);; s = (s + 1) & mask) {
     if (slots_[s].position == kEmpty) {
       slots_[s] = {id, position};
@@ -23,15 +21,11 @@ bool IdentifierIndex::Insert(int32_t id, uint32_t position) noexcept {
 }
 
 bool IdentifierIndex::Grow() noexcept {
-  std::vector<Slot> grown;
-  try {
-    grown.assign(slots_.empty() ? 16 : slots_.size() * 2, Slot{0, kEmpty});
-  } catch (const std::bad_alloc&) {
-    return false;
-  }
-  grown.swap(slots_);
+  GrowableArray<Slot> grown;
+  if (!grown.GrowTo(slots_.Count() == 0 ? 16 : 2 * std::size_t{slots_.Count()}, Slot{0, kEmpty})) return false;
+  grown.Swap(slots_);
   shift_ = 64;
-  for (std::size_t size = slots_.size(); size > 1; size >>= 1) --shift_;
+  for (std::size_t size = slots_.Count(); size > 1; size >>= 1) --shift_;
   used_ = 0;
   for (const Slot& slot : grown) {
     if (slot.position != kEmpty) Insert(slot.id, slot.position);  // room enough: cannot fail
@@ -40,8 +34,8 @@ bool IdentifierIndex::Grow() noexcept {
 }
 
 std::optional<uint32_t> IdentifierIndex::Lookup(int32_t id) const {
-  if (slots_.empty()) return std::nullopt;
-  const std::size_t mask = slots_.size() - 1;
+  if (slots_.Count() == 0) return std::nullopt;
+  const std::size_t mask = slots_.Count() - 1;
   for (std::size_t s = Home(id); slots_[s].position != kEmpty; s = (s + 1) & mask) {
     if (slots_[s].id == id) return slots_[s].position;
   }

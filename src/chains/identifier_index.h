@@ -13,7 +13,8 @@
 
 #include <cstdint>
 #include <optional>
-#include <vector>
+
+#include "chains/growable_array.h"
 
 class IdentifierIndex {
  public:
@@ -52,7 +53,7 @@ class IdentifierIndex {
   void Clear() noexcept;  // keeps the storage
   std::size_t Home(int32_t id) const;
 
-  std::vector<Slot> slots_;  // open addressing, linear probing, at most half full
+  GrowableArray<Slot> slots_;  // open addressing, linear probing, at most half full
   int shift_ = 64;           // 64 - log2 of the slot count
   std::size_t used_ = 0;
   uint32_t indexed_ = 0;  // elements 0 to indexed_ - 1 are in the index

@@ -4,12 +4,13 @@
 
 #include <algorithm>
 #include <cstdint>
-#include <vector>
+
+#include "chains/growable_array.h"
 
 template <typename T>
 class OrderedList {
  public:
-  uint32_t Count() const { return static_cast<uint32_t>(items_.size()); }
+  uint32_t Count() const { return items_.Count(); }
 
   // True when `index`, taken as signed, names an element.
   bool Holds(int32_t index) const { return index >= 0 && static_cast<uint32_t>(index) < Count(); }
@@ -19,18 +20,11 @@ class OrderedList {
 
   // Adds the element at the end. False when memory ran out; the list is then
   // exactly as it was.
-  bool Append(const T& item) noexcept {
-    try {
-      items_.push_back(item);
-      return true;
-    } catch (...) {
-      return false;
-    }
-  }
+  bool Append(const T& item) noexcept { return items_.Append(item); }
 
   // Removes one element; later elements move down one index. Storage is kept.
   void RemoveAt(uint32_t index) {
-    items_.erase(items_.begin() + index);
+    items_.Erase(index, 1);
     ++removals_;
   }
 
@@ -38,15 +32,9 @@ class OrderedList {
   // the rest, in one walk. Storage is kept.
   template <typename Predicate>
   void RemoveIf(Predicate doomed) {
-    const auto end = std::remove_if(items_.begin(), items_.end(), doomed);
+    const T* end = std::remove_if(items_.begin(), items_.end(), doomed);
     if (end == items_.end()) return;
-    items_.erase(end, items_.end());
-    ++removals_;
-  }
-
-  // Frees the storage and leaves the list empty.
-  void Release() {
-    std::vector<T>().swap(items_);
+    items_.Erase(static_cast<uint32_t>(end - items_.begin()), static_cast<uint32_t>(items_.end() - end));
     ++removals_;
   }
 
@@ -55,6 +43,6 @@ class OrderedList {
   uint64_t Removals() const { return removals_; }
 
  private:
-  std::vector<T> items_;
+  GrowableArray<T> items_;
   uint64_t removals_ = 0;
 };

@@ -1,7 +1,6 @@
 // What the frame editor shows of the object: its picture, or a preview of one
 // chain built from the template sizes of the setup dialog.
 #include <cmath>
-#include <cstdio>
 
 #include "chains/float_math.h"
 #include "editor/drawing_services.h"
@@ -24,7 +23,7 @@ int32_t Half(int32_t value) { return value / 2; }  // toward zero; never overflo
 // object's rounding to a float. Beyond the int32 range (a text such as
 // "1e999") it saturates.
 int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
-  return TruncateToInt(ParseDecimalPrefix(text, kSettingTextSize), 0);
+  return TruncateToInt(ParseDecimalPrefix(text), 0);
 }
 
 // cx + R cos(angle) or cy + R sin(angle), saturated as above when R is huge.
@@ -36,11 +35,36 @@ void DrawRectangle(HostSurface* surface, int32_t x1, int32_t y1, int32_t x2, int
   HostSurfaceRectangle(surface, x1, y1, x2, y2, 255, 0, 0, 1);
 }
 
+// Writes `value` in decimal, as "%i" would, at `out`; returns its end. Two
+// integers are all the labels print, so the C library's whole formatted
+// printing, with its floating-point and locale machinery, stays out.
+char* WriteDecimal(char* out, int32_t value) {
+  uint32_t magnitude = static_cast<uint32_t>(value);
+  if (value < 0) {
+    *out++ = '-';
+    magnitude = 0u - magnitude;  // also for the lowest int32
+  }
+  char digits[10];
+  int count = 0;
+  do {
+    digits[count++] = static_cast<char>('0' + magnitude % 10);
+    magnitude /= 10;
+  } while (magnitude != 0);
+  while (count > 0) *out++ = digits[--count];
+  return out;
+}
+
 void DrawLabel(HostSurface* surface, int32_t shownX, int32_t shownY, RECT rect) {
-  // Two signed 32-bit numbers, a comma and two brackets: at most 25
+  // "(x,y)": two signed 32-bit numbers, a comma and two brackets, at most 25
   // characters, so the text always fits with its terminator.
   char text[26];
-  std::snprintf(text, sizeof text, "(%i,%i)", static_cast<int>(shownX), static_cast<int>(shownY));
+  char* end = text;
+  *end++ = '(';
+  end = WriteDecimal(end, shownX);
+  *end++ = ',';
+  end = WriteDecimal(end, shownY);
+  *end++ = ')';
+  *end = '\0';
   HostSurfaceDrawText(surface, text, -1, &rect, 1, 0, 0, 1, 0, 0, 0, 0, 0, 8);
 }
 

@@ -1,4 +1,5 @@
 // Entry point, self-description and the life of the run-time object.
+#include <cstdlib>
 #include <new>
 
 #include "chains/run_data.h"
@@ -15,14 +16,22 @@ namespace {
 HINSTANCE g_module = nullptr;
 
 float SettingValue(const char (&text)[kSettingTextSize]) {
-  return RoundToFloat(ParseDecimalPrefix(text, kSettingTextSize));
+  return RoundToFloat(ParseDecimalPrefix(text));
+}
+
+// A new empty list, or null when memory ran out. The lists are built in
+// storage from malloc, and freed with free, like the elements they hold.
+template <typename List>
+List* NewList() {
+  void* storage = std::malloc(sizeof(List));
+  return storage != nullptr ? new (storage) List : nullptr;
 }
 
 template <typename List>
 void DeleteList(List*& list) {
   if (list == nullptr) return;
-  list->Release();
-  delete list;
+  list->~List();
+  std::free(list);
   list = nullptr;
 }
 
@@ -63,9 +72,9 @@ TAVRIN_EXPORT int16_t TVCALL GetRunObjectInfos(void*, RunInfo* info) {
 TAVRIN_EXPORT uint16_t TVCALL GetRunObjectDataSize(void*, EditData*) { return sizeof(RunData); }
 
 TAVRIN_EXPORT int16_t TVCALL CreateRunObject(RunData* rd, EditData* edit, void*) {
-  rd->links = new (std::nothrow) ObjectList;
-  rd->platforms = new (std::nothrow) ObjectList;
-  rd->chains = new (std::nothrow) ChainList;
+  rd->links = NewList<ObjectList>();
+  rd->platforms = NewList<ObjectList>();
+  rd->chains = NewList<ChainList>();
   if (rd->links == nullptr || rd->platforms == nullptr || rd->chains == nullptr) {
     DeleteList(rd->links);
     DeleteList(rd->platforms);

@@ -21,6 +21,11 @@ void CanvasDestroy(Canvas* canvas);
 Canvas* CanvasFromBitmap(int32_t width, int32_t height, const uint8_t* palette, int paletteSize,
                          const uint8_t* pixels, int32_t stride);
 
+// Which part of the coordinates the canvas shows, as a scrolled and zoomed
+// editor does: (left, top) at its top-left corner, `scale` pixels per unit.
+// A new canvas shows (0, 0) at scale 1. Drawing goes through the view.
+void CanvasView(Canvas* canvas, double left, double top, double scale);
+
 void CanvasBlit(const Canvas* source, Canvas* destination, int32_t x, int32_t y);
 // A one-pixel outline from (x1, y1) to (x2 - 1, y2 - 1); `colour` is
 // 0x00bbggrr.

@@ -4,6 +4,7 @@
 #include <fontconfig/fontconfig.h>
 
 #include <algorithm>
+#include <cmath>
 
 #include "canvas.h"
 
@@ -11,6 +12,7 @@ namespace dravo2 {
 
 struct Canvas {
   cairo_surface_t* image;
+  double left = 0.0, top = 0.0, scale = 1.0;  // the view
 };
 
 namespace {
@@ -19,10 +21,17 @@ namespace {
 // than this is off every canvas anyway.
 double Coordinate(long long value) { return static_cast<double>(std::clamp(value, -100000LL, 100000LL)); }
 
+// A context that draws in the canvas's pixels; View() makes it draw in the
+// coordinates of the view.
 cairo_t* Draw(Canvas* canvas) {
   cairo_t* cr = cairo_create(canvas->image);
   cairo_set_antialias(cr, CAIRO_ANTIALIAS_NONE);
   return cr;
+}
+
+void View(cairo_t* cr, const Canvas* canvas) {
+  cairo_scale(cr, canvas->scale, canvas->scale);
+  cairo_translate(cr, -canvas->left, -canvas->top);
 }
 
 void Finish(Canvas* canvas, cairo_t* cr) {
@@ -77,15 +86,25 @@ Canvas* CanvasFromBitmap(int32_t width, int32_t height, const uint8_t* palette, 
   return canvas;
 }
 
+void CanvasView(Canvas* canvas, double left, double top, double scale) {
+  canvas->left = left;
+  canvas->top = top;
+  canvas->scale = scale;
+}
+
 void CanvasBlit(const Canvas* source, Canvas* destination, int32_t x, int32_t y) {
   cairo_t* cr = Draw(destination);
+  View(cr, destination);
   cairo_set_source_surface(cr, source->image, Coordinate(x), Coordinate(y));
   cairo_paint(cr);
   Finish(destination, cr);
 }
 
 void CanvasRectangle(Canvas* canvas, int32_t x1, int32_t y1, int32_t x2, int32_t y2, uint32_t colour) {
-  const double left = Coordinate(x1), top = Coordinate(y1), right = Coordinate(x2), bottom = Coordinate(y2);
+  // In pixels, so that the outline stays one pixel wide at any scale.
+  const auto pixel = [&](int32_t value, double origin) { return std::floor((Coordinate(value) - origin) * canvas->scale); };
+  const double left = pixel(x1, canvas->left), top = pixel(y1, canvas->top);
+  const double right = pixel(x2, canvas->left), bottom = pixel(y2, canvas->top);
   cairo_t* cr = Draw(canvas);
   cairo_set_source_rgb(cr, (colour & 0xFF) / 255.0, (colour >> 8 & 0xFF) / 255.0, (colour >> 16 & 0xFF) / 255.0);
   cairo_set_line_width(cr, 1);
@@ -101,6 +120,7 @@ void CanvasText(Canvas* canvas, const char* text, const RECT& rect) {
   const double right = Coordinate(rect.right), bottom = Coordinate(rect.bottom);
   if (right <= left || bottom <= top) return;
   cairo_t* cr = Draw(canvas);
+  View(cr, canvas);
   cairo_rectangle(cr, left, top, right - left, bottom - top);
   cairo_clip(cr);
   cairo_select_font_face(cr, "sans-serif", CAIRO_FONT_SLANT_NORMAL, CAIRO_FONT_WEIGHT_NORMAL);

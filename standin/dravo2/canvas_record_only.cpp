@@ -9,6 +9,7 @@ struct Canvas {};
 Canvas* CanvasCreate(int32_t, int32_t, bool) { return new Canvas; }
 void CanvasDestroy(Canvas* canvas) { delete canvas; }
 Canvas* CanvasFromBitmap(int32_t, int32_t, const uint8_t*, int, const uint8_t*, int32_t) { return new Canvas; }
+void CanvasView(Canvas*, double, double, double) {}
 void CanvasBlit(const Canvas*, Canvas*, int32_t, int32_t) {}
 void CanvasRectangle(Canvas*, int32_t, int32_t, int32_t, int32_t, uint32_t) {}
 void CanvasText(Canvas*, const char*, const RECT&) {}

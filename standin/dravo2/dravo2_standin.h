@@ -37,6 +37,11 @@ DRAVO2_STANDIN_API void StandinClearDrawingCalls(void);
 // with that id, or null when the module has none.
 DRAVO2_STANDIN_API void StandinSetBitmapSource(const void* (*source)(HINSTANCE module, int32_t id));
 
+// Makes the editor window show the editor's coordinates from (left, top)
+// at `scale` pixels per unit, as a scrolled and zoomed-out editor does; a
+// window opens showing (0, 0) at scale 1.
+DRAVO2_STANDIN_API void StandinViewEditorWindow(int32_t left, int32_t top, double scale);
+
 // Writes the editor window's surface as PNG; false when there is no window
 // or the stream fails.
 DRAVO2_STANDIN_API bool StandinWriteEditorPng(std::FILE* stream);

@@ -210,6 +210,10 @@ void StandinClearDrawingCalls(void) { g_calls.clear(); }
 #if !defined(_WIN32)
 void StandinSetBitmapSource(const void* (*source)(HINSTANCE module, int32_t id)) { g_bitmapSource = source; }
 
+void StandinViewEditorWindow(int32_t left, int32_t top, double scale) {
+  if (g_window != nullptr && scale > 0.0) dravo2::CanvasView(g_window->surface.canvas, left, top, scale);
+}
+
 bool StandinWriteEditorPng(std::FILE* stream) {
   return g_window != nullptr && dravo2::CanvasWritePng(g_window->surface.canvas, stream);
 }

@@ -41,6 +41,8 @@ std::vector<std::string> EditorWindow::TakeCalls() {
 }
 
 #if !defined(_WIN32)
+void EditorWindow::View(int32_t left, int32_t top, double scale) { StandinViewEditorWindow(left, top, scale); }
+
 bool EditorWindow::WritePng(std::FILE* stream) const { return StandinWriteEditorPng(stream); }
 #endif
 

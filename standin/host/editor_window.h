@@ -28,6 +28,9 @@ class EditorWindow {
   std::vector<std::string> TakeCalls();
 
 #if !defined(_WIN32)
+  // Shows the editor from (left, top) at `scale` pixels per unit, as a
+  // scrolled and zoomed-out editor does: for what a window cannot hold.
+  void View(int32_t left, int32_t top, double scale);
   // The window's picture as PNG; false when the stream fails.
   bool WritePng(std::FILE* stream) const;
 #endif

@@ -56,14 +56,85 @@ TEST(EditorPreview, BadInputIsNamedAndLeavesTheOutputAlone) {
       {{"--settings", "saved.bin", "saved.bin"}, "this is --settings"},
       {{"out.png", "--left"}, "--left needs a value"},
       {{}, "no output file given"},
+      {{"--settings", ".", "out.png"}, "cannot read settings file .: Is a directory"},
+      {{"--settings", "/dev/zero", "out.png"}, "settings file /dev/zero holds more than 100 bytes"},
+      {{"--left", "1", "--left=2", "out.png"}, "--left given twice (1, then 2)"},
+      {{"--version=1"}, "--version takes no value"},
+      {{"--explain", "--window-width", "9", "out.png"}, "--explain sizes its picture"},
+      {{"--save-settings", "./out.png", "out.png"}, "--save-settings ./out.png: also written by the output"},
   };
   for (const auto& c : cases) {
     const ToolRun run = RunTool(EDITOR_PREVIEW, c.args, folder);
     EXPECT_EQ(run.status, 2) << c.message;
+    EXPECT_EQ(run.out, "");
     EXPECT_NE(run.err.find(c.message), std::string::npos) << run.err;
     EXPECT_EQ(run.err.find('\n'), run.err.size() - 1) << run.err;
     EXPECT_EQ(ReadFile(folder / "out.png"), "old");
   }
+}
+
+// Settings no author means are drawn all the same, each said once.
+TEST(EditorPreview, WarnsOfNonsenseSizesOnceAndDraws) {
+  Folder folder;
+  const struct {
+    std::vector<std::string> args;
+    std::vector<std::string> warnings;  // what each line says after "editor_preview: warning: "
+  } cases[] = {
+      {{"--view-template", "1", "--number-of-links", "-2", "--anchor-width", "-4"},
+       {"the number of links is -2, less than 0", "the anchor width is -4, less than 0",
+        "the object comes out 0 x -32 pixels"}},
+      {{"--view-template", "1", "--number-of-links", "1000"}, {"the object would be 64128 x 64096 pixels, beyond what its stored 16-bit"}},
+      {{"--view-template", "7"}, {"view-template is 7: the frame editor draws nothing for it"}},
+  };
+  for (const auto& c : cases) {
+    std::vector<std::string> args = c.args;
+    args.insert(args.end(), {"--explain", "out.png"});
+    const ToolRun run = RunTool(EDITOR_PREVIEW, args, folder);
+    EXPECT_EQ(run.status, 0) << run.err;
+    const std::vector<std::string> lines = Lines(run.err);
+    ASSERT_EQ(lines.size(), c.warnings.size()) << run.err;
+    for (std::size_t i = 0; i < lines.size(); ++i) {
+      EXPECT_EQ(lines[i].rfind("editor_preview: warning: " + c.warnings[i], 0), 0u) << lines[i];
+    }
+  }
+}
+
+// An object larger than a picture is scaled down to fit, in both views,
+// never cut to a blank picture.
+TEST(EditorPreview, LargeObjectIsScaledDownToFit) {
+  Folder folder;
+  for (const bool explain : {false, true}) {
+    std::vector<std::string> args = {"--view-template=1", "--number-of-links", "200", "big.png"};
+    if (explain) args.push_back("--explain");
+    const ToolRun run = RunTool(EDITOR_PREVIEW, args, folder);
+    EXPECT_NE(run.out.find("drawn at 1/4 of its size"), std::string::npos) << run.out << run.err;
+    cairo_surface_t* image = cairo_image_surface_create_from_png((folder / "big.png").c_str());
+    const int width = cairo_image_surface_get_width(image), height = cairo_image_surface_get_height(image);
+    EXPECT_TRUE(width > 1024 && width <= 4096 && height > 1024 && height <= 4096) << width << "x" << height;
+    int red = 0;
+    for (int y = 0; y < height; ++y) {
+      const auto* row = reinterpret_cast<const uint32_t*>(cairo_image_surface_get_data(image) +
+                                                           y * cairo_image_surface_get_stride(image));
+      for (int x = 0; x < width; ++x) red += (row[x] & 0xFFFFFFu) == 0xFF0000u;
+    }
+    EXPECT_GT(red, 50) << explain;  // the four outlines of the library's drawing
+    cairo_surface_destroy(image);
+  }
+}
+
+// The record written for given options shows as those options do.
+TEST(EditorPreview, SavedSettingsDrawAsTheirOptions) {
+  Folder folder;
+  const std::vector<std::string> options = {"--view-template", "1", "--number-of-links", "4", "--starting-angle", "30"};
+  std::vector<std::string> args = options;
+  args.insert(args.end(), {"--save-settings", "s.bin", "given.png"});
+  ASSERT_EQ(RunTool(EDITOR_PREVIEW, args, folder).status, 0);
+  const ToolRun run = RunTool(EDITOR_PREVIEW, {"--settings", "-", "saved.png"}, folder, "s.bin");
+  ASSERT_EQ(run.status, 0) << run.err;
+  EXPECT_EQ(ReadFile(folder / "saved.png"), ReadFile(folder / "given.png"));
+  const std::string record = ReadFile(folder / "s.bin");
+  ASSERT_EQ(record.size(), 100u);
+  EXPECT_EQ(static_cast<uint8_t>(record[24]) | static_cast<uint8_t>(record[25]) << 8, 64 + 2 * 160);  // the object's width
 }
 
 }  // namespace

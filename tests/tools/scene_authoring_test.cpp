@@ -75,26 +75,48 @@ TEST(SceneAuthoringTest, RepeatingEntryPlaysAsTheSameStepsWrittenFrameByFrame) {
   }
 }
 
+// Every kind of warning, each once although its cause lasts or recurs: the
+// repeating entry addresses a chain that is not there at every frame. The
+// link created at frame 6 under a destroyed link's name is added again.
 TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
   Folder folder;
-  folder.Write("scene.json", R"({"frames": 5, "settings": {"gravity": "9.8x"},
+  folder.Write("scene.json", R"({"frames": 5, "frames": 8, "settings": {"gravity": "9.8x", "startAngle": "400"},
     "objects": )" + Objects({{"a", 10, 10, 4, 4}, {"b", 50, 10, 4, 4}, {"l1", 0, 0, 4, 10}, {"l2", 0, 0, 4, 12},
-                               {"l3", 0, 0, 4, 10}}) + R"(,
+                               {"l3", 0, 0, 4, 10}, {"l4", 0, 0, 4, 10}, {"p", 0, 0, 4, 4}}) + R"(,
     "timeline": [{"frame": 0, "do": [{"action": "Add Anchor", "params": ["a"]}, {"action": "Add Anchor", "params": ["b"]},
       {"action": "Add Link", "params": ["l1"]}, {"action": "Add Link", "params": ["l2"]},
-      {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"}]},
-      {"frame": 2, "do": [{"action": "Set Angle", "params": [1, 1e39]}]}]})");
+      {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"},
+      {"move": "p", "by": [{"expression": "PlatformX(", "params": [0]}, 0]}]},
+      {"every": 1, "from": 0, "do": [{"action": "Stop Chain", "params": [5]}]},
+      {"frame": 2, "do": [{"action": "Set Angle", "params": [1, 1e39]}]},
+      {"frame": 3, "do": [{"action": "Add Link", "params": ["l4"]}]},
+      {"frame": 4, "do": [{"action": "Set Speed at index %0 to %1", "params": [0, 500]}]},
+      {"frame": 5, "do": [{"destroy": "l1"}, {"destroy": "l2"}, {"destroy": "l3"}, {"destroy": "l4"}]},
+      {"frame": 6, "do": [{"create": {"name": "l1", "x": 0, "y": 0, "width": 4, "height": 10}},
+        {"action": "Add Link", "params": ["l1"]}]}],
+    "onSwing": [{"chain": 2, "do": []}]})");
   const ToolRun run = RunPlayer({"scene.json"}, folder);
   EXPECT_EQ(run.status, 0);
   const std::vector<std::string> expected = {
-      "scene.json: settings.gravity: warning: the text \"9.8x\" is not a number; the library reads the number it "
-      "starts with, here 9.8",
-      "scene.json: frame 0: warning: 3 links do not divide evenly among 2 chains",
-      "scene.json: frame 0: warning: links of differing heights (10 and 12)",
-      "scene.json: frame 2: warning: chain 1 holds a value that is no longer finite (inf)"};
+      "frames: warning: the key \"frames\" is given twice in one object",
+      "settings.gravity: warning: the text \"9.8x\" is not a number; the library reads the number it starts with, "
+      "here 9.8",
+      "settings.startAngle: warning: every chain starts 400 degrees from hanging straight down",
+      "timeline[0].do[6]: warning: \"PlatformX(\" asks for platform 0, but there is no platform at that moment",
+      "timeline[1].do[0]: warning: \"Stop Chain\" addresses chain 5, but there are only 2 chains (0 to 1)",
+      "frame 0: warning: 3 links do not divide evenly among 2 chains",
+      "frame 0: warning: links of differing heights (10 and 12)",
+      "frame 2: warning: chain 1 holds a value that is no longer finite (inf)",
+      "frame 3: warning: link \"l2\" went from the chain of anchor \"b\" to the chain of anchor \"a\"",
+      "frame 4: warning: chain 0 turns 499.798 degrees in one frame, more than a full turn",
+      "frame 5: warning: a chain swings with no links at all",
+      "frame 6: warning: 1 link does not divide evenly among 2 chains",
+      "onSwing[0].chain: warning: the rule is for chain 2, but the scene never had more than 2 chains"};
   const std::vector<std::string> lines = Lines(run.err);
   ASSERT_EQ(lines.size(), expected.size()) << run.err;
-  for (std::size_t i = 0; i < lines.size(); ++i) EXPECT_EQ(lines[i].substr(0, expected[i].size()), expected[i]);
+  for (std::size_t i = 0; i < lines.size(); ++i) {
+    EXPECT_EQ(lines[i].substr(0, expected[i].size() + 12), "scene.json: " + expected[i]);
+  }
 }
 
 // One anchor at (100, 50), three links 32 high, one platform, a rider that an

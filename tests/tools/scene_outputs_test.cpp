@@ -71,6 +71,9 @@ const OutputCase kOutputCases[] = {
     {"StandardOutputTwice", nullptr, {"--gif", "-", "--trace", "-"}, 2, "--trace -: standard output is already taken by --gif", nullptr},
     {"StandardOutput", nullptr, {"--trace", "-"}, 0, "-: 3 lines",
      [](const Folder&, const ToolRun& run, int) { EXPECT_EQ(Lines(run.out).size(), 3u); }},
+    // The hidden temporary name must fit too.
+    {"LongestName", nullptr, {"--trace", std::string(249, 'n') + ".jsonl"}, 0, "",
+     [](const Folder& f, const ToolRun&, int) { EXPECT_TRUE(fs::exists(f / (std::string(249, 'n') + ".jsonl"))); }},
     // As root no permission keeps a folder from being written: a folder
     // that is a regular file does.
     {"UnwritableFolder", nullptr, {"--gif", "g.gif", "--trace", "scene.json/t.jsonl"}, 1,
@@ -101,6 +104,32 @@ TEST_P(OutputPathTest, WritesWhereThePathLeadsAndLeavesNoPartialFile) {
 
 INSTANTIATE_TEST_SUITE_P(Paths, OutputPathTest, ::testing::ValuesIn(kOutputCases),
                          [](const auto& info) { return std::string(info.param.name); });
+
+// The grammar's forms that are easy to get wrong: values after "=", "--"
+// before an operand that starts with "-", the scene from standard input,
+// and PNG names with "%%" and a width.
+TEST(CommandLineTest, FollowsTheGnuForms) {
+  const struct {
+    std::vector<std::string> args;
+    std::vector<std::string> files;  // besides the scene
+  } cases[] = {
+      {{"-", "--gif=in.gif", "--trace=t.jsonl"}, {"in.gif", "t.jsonl"}},
+      {{"--gif", "g.gif", "--", "-s.json"}, {"-s.json", "g.gif"}},
+      {{"scene.json", "--png", "f%%%3d.png", "--png-frame", "1,2"}, {"f%  1.png", "f%  2.png", "scene.gif"}},
+  };
+  for (const auto& c : cases) {
+    Folder folder;
+    folder.Write("scene.json", kScene);
+    folder.Write("-s.json", kScene);
+    const ToolRun run = RunPlayer(c.args, folder, "scene.json");
+    EXPECT_EQ(run.status, 0) << run.err;
+    std::vector<std::string> files = c.files;
+    files.insert(files.end(), {"-s.json", "scene.json"});
+    std::sort(files.begin(), files.end());
+    files.erase(std::unique(files.begin(), files.end()), files.end());
+    EXPECT_EQ(folder.Files(), files) << c.args[0];
+  }
+}
 
 class InterruptedRunTest : public ::testing::TestWithParam<int> {};
 

@@ -81,14 +81,16 @@ struct ToolRun {
   std::string err;  // standard error
 };
 
-// Runs `program` with `args` in `folder`. What it prints goes to a folder of
-// its own, so that the files it leaves in `folder` are only its own.
-inline ToolRun RunTool(const std::string& program, const std::vector<std::string>& args, const Folder& folder) {
+// Runs `program` with `args` in `folder`, standard input from `input` (a
+// path from `folder`) or empty. What it prints goes to a folder of its own,
+// so that the files it leaves in `folder` are only its own.
+inline ToolRun RunTool(const std::string& program, const std::vector<std::string>& args, const Folder& folder,
+                       const std::string& input = "/dev/null") {
   const auto quoted = [](const std::string& word) { return "'" + word + "'"; };
   Folder captured;
   std::string command = "cd " + quoted(folder.path()) + " && exec " + quoted(program);
   for (const std::string& arg : args) command += " " + quoted(arg);
-  command += " >" + quoted(captured / "out") + " 2>" + quoted(captured / "err");
+  command += " <" + quoted(input) + " >" + quoted(captured / "out") + " 2>" + quoted(captured / "err");
   const int status = std::system(command.c_str());
   ToolRun run;
   if (status != -1 && WIFEXITED(status)) run.status = WEXITSTATUS(status);
@@ -98,8 +100,9 @@ inline ToolRun RunTool(const std::string& program, const std::vector<std::string
 }
 
 #ifdef SCENE_PLAYER
-inline ToolRun RunPlayer(const std::vector<std::string>& args, const Folder& folder) {
-  return RunTool(SCENE_PLAYER, args, folder);
+inline ToolRun RunPlayer(const std::vector<std::string>& args, const Folder& folder,
+                         const std::string& input = "/dev/null") {
+  return RunTool(SCENE_PLAYER, args, folder, input);
 }
 #endif
 

@@ -1,87 +1,89 @@
 // editor_preview: runs the library's editor display for given settings, as
-// the frame editor calls it, and writes what the editor shows as a PNG.
-#include <algorithm>
-#include <cstdint>
+// the frame editor calls it, and writes what the editor shows as a PNG, or
+// that view explained; it can also write the settings record.
 #include <iostream>
+#include <optional>
 #include <stdexcept>
 
-#include "editor_window.h"
-#include "frame/exports.h"
+#include "explained_view.h"
+#include "library_view.h"
 #include "output_file.h"
 #include "output_paths.h"
 #include "partial_files.h"
 #include "preview_options.h"
+#include "preview_warnings.h"
+#include "shown_text.h"
+#include "tool_main.h"
 
 namespace {
 
-using editor_preview::PreviewOptions;
+using namespace editor_preview;
+using tool_input::Shown;
 
-constexpr int kFailed = 1;
-constexpr int kBadInput = 2;
-// Room beyond the object's rectangle for the labels, which reach past it.
-constexpr int64_t kLabelRoom = 64;
-
-int32_t WindowSide(int32_t chosen, int64_t end) {
-  if (chosen != 0) return chosen;
-  return static_cast<int32_t>(std::clamp<int64_t>(end + kLabelRoom, 1, 4096));
+std::string ViewName(const EditData& settings, bool explained) {
+  const std::string view = settings.viewTemplate == 1   ? "the template view"
+                           : settings.viewTemplate == 0 ? "the object's picture"
+                                                        : "an empty view";
+  return explained ? view + ", explained" : view;
 }
 
-RECT Place(const PreviewOptions& options) {
-  RECT rect{};
-  rect.left = options.left;
-  rect.top = options.top;
-  return rect;
-}
+int Main(int argc, char** argv) {
+  const PreviewOptions options = ReadPreviewOptions(argc, argv);
+  if (options.help) {
+    std::cout << kUsage;
+    return 0;
+  }
+  if (options.version) {
+    std::cout << "editor_preview " << TAVRIN_VERSION << '\n';
+    return 0;
+  }
+  // Neither the picture nor the record replaces the settings file they were
+  // made from, or each other.
+  std::vector<tool_output::NamedPath> inputs, outputs;
+  if (!options.settingsFile.empty() && options.settingsFile != "-") inputs.push_back({"--settings", options.settingsFile});
+  if (!options.output.empty()) outputs.push_back({"the output", options.output});
+  if (!options.saveSettings.empty()) outputs.push_back({"--save-settings", options.saveSettings});
+  if (const std::string conflict = tool_output::OutputConflict(inputs, outputs); !conflict.empty()) {
+    throw UsageError(conflict);
+  }
+  tool_output::WatchPartialFiles(outputs.size());
 
-// The host's record of the placed object, which the library passes on to
-// GetObjectRect without reading it.
-char g_placedObject[64];
+  // A first display, as the editor makes whenever it draws, gives the
+  // object's rectangle and what is drawn where.
+  const Drawing drawing = ProbeDisplay(options);
+  for (const std::string& warning : PreviewWarnings(options.settings, drawing.settings)) {
+    std::cerr << "editor_preview: warning: " << warning << '\n';
+  }
+
+  std::optional<tool_output::OutputFile> picture, record;
+  PictureSize size;
+  if (!options.output.empty()) {
+    picture.emplace(options.output);
+    size = options.explain ? WriteExplainedView(picture->stream(), options, drawing)
+                           : WriteEditorView(picture->stream(), options, drawing.rect);
+    picture->Close();
+  }
+  if (!options.saveSettings.empty()) {
+    // The record as the editor leaves it after drawing, which is what the
+    // host stores.
+    record.emplace(options.saveSettings);
+    std::fwrite(&drawing.settings, sizeof drawing.settings, 1, record->stream());
+    record->Close();
+  }
+  if (picture) picture->Commit();
+  if (record) record->Commit();
+
+  std::ostream& report = options.output == "-" || options.saveSettings == "-" ? std::cerr : std::cout;
+  if (picture) {
+    report << Shown(options.output) << ": " << size.width << "x" << size.height << " picture of "
+           << ViewName(drawing.settings, options.explain);
+    if (size.divisor > 1) report << ", drawn at 1/" << size.divisor << " of its size to fit";
+    report << '\n';
+  }
+  if (record) report << Shown(options.saveSettings) << ": the " << sizeof(EditData) << "-byte settings record\n";
+  return 0;
+}
 
 }  // namespace
 
-int main(int argc, char** argv) {
-  PreviewOptions options;
-  try {
-    options = editor_preview::ReadPreviewOptions(argc, argv);
-  } catch (const editor_preview::UsageError& error) {
-    std::cerr << "editor_preview: " << error.what() << "\n";
-    return kBadInput;
-  }
-  if (options.help) {
-    std::cout << editor_preview::kUsage;
-    return 0;
-  }
-  // The picture never replaces the settings file it was made from.
-  if (!options.settingsFile.empty()) {
-    const std::string conflict = tool_output::OutputConflict({{"--settings", options.settingsFile}},
-                                                             {{"output", options.output}});
-    if (!conflict.empty()) {
-      std::cerr << "editor_preview: " << conflict << "\n";
-      return kBadInput;
-    }
-  }
-  tool_output::WatchPartialFiles(1);
-
-  // A first display, as the editor makes whenever it draws, gives the
-  // object's rectangle and so the size of the picture.
-  EditData settings = options.settings;
-  RECT rect = Place(options);
-  {
-    standin::EditorWindow probe(1, 1);
-    EditorDisplay(probe.host(), nullptr, g_placedObject, &settings, &rect);
-  }
-  standin::EditorWindow window(WindowSide(options.windowWidth, rect.right),
-                               WindowSide(options.windowHeight, rect.bottom));
-  rect = Place(options);
-  EditorDisplay(window.host(), nullptr, g_placedObject, &settings, &rect);
-
-  try {
-    tool_output::OutputFile output(options.output);
-    if (!window.WritePng(output.stream())) throw std::runtime_error("cannot write " + options.output);
-    output.Commit();
-  } catch (const std::runtime_error& error) {
-    std::cerr << "editor_preview: " << error.what() << "\n";
-    return kFailed;
-  }
-  return 0;
-}
+int main(int argc, char** argv) { return tool_input::RunToolMain("editor_preview", argc, argv, &Main); }

@@ -9,6 +9,7 @@
 
 #include "output_paths.h"
 #include "partial_files.h"
+#include "shown_text.h"
 
 namespace tool_output {
 
@@ -19,6 +20,19 @@ mode_t NewFileMode() {
   const mode_t mask = umask(0);
   umask(mask);
   return 0666 & ~mask;
+}
+
+// ".NAME.XXXXXX" beside the file. A name the file system takes must stay
+// writable: when the eight added characters would make the hidden name too
+// long, NAME is cut to fit.
+std::string TemporaryPattern(const std::string& target) {
+  const auto slash = target.rfind('/');
+  const std::string folder = slash == std::string::npos ? "" : target.substr(0, slash + 1);
+  std::string name = slash == std::string::npos ? target : target.substr(slash + 1);
+  const long longest = pathconf(folder.empty() ? "." : folder.c_str(), _PC_NAME_MAX);
+  const std::size_t room = (longest > 0 ? static_cast<std::size_t>(longest) : 255) - 8;
+  if (name.size() > room) name.resize(room);
+  return folder + "." + name + ".XXXXXX";
 }
 
 }  // namespace
@@ -39,10 +53,7 @@ OutputFile::OutputFile(std::string path) : path_(std::move(path)) {
     return;
   }
 
-  const auto slash = target_.rfind('/');
-  const std::string folder = slash == std::string::npos ? "" : target_.substr(0, slash + 1);
-  const std::string name = slash == std::string::npos ? target_ : target_.substr(slash + 1);
-  std::string pattern = folder + "." + name + ".XXXXXX";
+  std::string pattern = TemporaryPattern(target_);
   std::vector<char> buffer(pattern.begin(), pattern.end());
   buffer.push_back('\0');
   int fd = -1;
@@ -100,7 +111,7 @@ void OutputFile::Commit() {
 
 void OutputFile::Fail(const std::string& what, int error) {
   Discard();
-  throw std::runtime_error(what + " " + path_ + ": " + std::strerror(error));
+  throw std::runtime_error(what + " " + tool_input::Shown(path_) + ": " + std::strerror(error));
 }
 
 }  // namespace tool_output

@@ -1,5 +1,6 @@
 // One output of a run. A regular file, or a name where there is none yet, is
-// written under a hidden temporary name (.NAME.XXXXXX) in its folder and
+// written under a hidden temporary name (.NAME.XXXXXX, NAME cut short when
+// the whole would be longer than the folder takes) in its folder and
 // renamed over the name by Commit(), so that it appears only when complete
 // and a failed or interrupted run leaves neither it nor a partial file. A
 // symbolic link is followed: the file it points at is replaced and the link

@@ -8,6 +8,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include "shown_text.h"
+
 namespace tool_output {
 
 namespace {
@@ -53,7 +55,7 @@ std::string FollowLinks(const std::string& path) {
     const std::string text(target, static_cast<std::size_t>(length));
     current = text.front() == '/' ? text : FolderOf(current) + "/" + text;
   }
-  throw std::runtime_error("cannot write " + path + ": " + std::strerror(ELOOP));
+  throw std::runtime_error("cannot write " + tool_input::Shown(path) + ": " + std::strerror(ELOOP));
 }
 
 std::string OutputConflict(const std::vector<NamedPath>& inputs, const std::vector<NamedPath>& outputs) {
@@ -64,7 +66,7 @@ std::string OutputConflict(const std::vector<NamedPath>& inputs, const std::vect
   const std::size_t inputCount = seen.size();
   const NamedPath* standardOutput = nullptr;
   for (const NamedPath& output : outputs) {
-    const std::string name = output.option + " " + output.path;
+    const std::string name = output.option + " " + tool_input::Shown(output.path);
     if (output.path == "-") {
       if (standardOutput) return name + ": standard output is already taken by " + standardOutput->option;
       standardOutput = &output;
@@ -76,10 +78,12 @@ std::string OutputConflict(const std::vector<NamedPath>& inputs, const std::vect
       if (!(seen[i].second == *identity)) continue;
       const NamedPath& other = *seen[i].first;
       if (i < inputCount) {
-        return name + ": this is " + other.option + " (" + other.path + "); expected a file of its own for the output";
+        return name + ": this is " + other.option + " (" + tool_input::Shown(other.path) +
+               "); expected a file of its own for the output";
       }
       if (!identity->shareable) {
-        return name + ": also written by " + other.option + " " + other.path + "; expected a file of its own";
+        return name + ": also written by " + other.option + " " + tool_input::Shown(other.path) +
+               "; expected a file of its own";
       }
     }
     seen.emplace_back(&output, *identity);

@@ -5,6 +5,8 @@
 #include <stdexcept>
 #include <string>
 
+#include "shown_text.h"
+
 namespace scene_player {
 
 namespace {
@@ -45,28 +47,29 @@ Box ChangedBox(const std::vector<uint8_t>& before, const std::vector<uint8_t>& a
 
 }  // namespace
 
-GifWriter::GifWriter(std::FILE* file, int width, int height, const std::vector<Colour>& palette, int delay)
-    : width_(width), height_(height), delay_(delay) {
+GifWriter::GifWriter(std::FILE* file, std::string name, int width, int height, const std::vector<Colour>& palette,
+                     int delay)
+    : name_(std::move(name)), width_(width), height_(height), delay_(delay) {
   int error = 0;
   gif_.reset(EGifOpen(file, &WriteToFile, &error));
-  if (gif_ == nullptr) throw std::runtime_error(std::string("cannot start the GIF: ") + GifErrorString(error));
+  if (gif_ == nullptr) Fail(GifErrorString(error));
   EGifSetGifVersion(gif_.get(), true);
 
   std::vector<GifColorType> colours(static_cast<std::size_t>(TableSize(palette.size())), GifColorType{0, 0, 0});
   for (std::size_t i = 0; i < palette.size(); ++i) colours[i] = {palette[i].r, palette[i].g, palette[i].b};
   ColorMapObject* map = GifMakeMapObject(static_cast<int>(colours.size()), colours.data());
-  if (map == nullptr) throw std::runtime_error("cannot start the GIF: out of memory");
+  if (map == nullptr) Fail("out of memory");
   const int result = EGifPutScreenDesc(gif_.get(), width, height, 8, 0, map);
   GifFreeMapObject(map);
-  Check(result, "write the GIF header");
+  Check(result);
 
   // Loop for ever.
   static const GifByteType kApplication[] = {'N', 'E', 'T', 'S', 'C', 'A', 'P', 'E', '2', '.', '0'};
   static const GifByteType kLoop[] = {1, 0, 0};
-  Check(EGifPutExtensionLeader(gif_.get(), APPLICATION_EXT_FUNC_CODE), "write the GIF loop marker");
-  Check(EGifPutExtensionBlock(gif_.get(), sizeof kApplication, kApplication), "write the GIF loop marker");
-  Check(EGifPutExtensionBlock(gif_.get(), sizeof kLoop, kLoop), "write the GIF loop marker");
-  Check(EGifPutExtensionTrailer(gif_.get()), "write the GIF loop marker");
+  Check(EGifPutExtensionLeader(gif_.get(), APPLICATION_EXT_FUNC_CODE));
+  Check(EGifPutExtensionBlock(gif_.get(), sizeof kApplication, kApplication));
+  Check(EGifPutExtensionBlock(gif_.get(), sizeof kLoop, kLoop));
+  Check(EGifPutExtensionTrailer(gif_.get()));
 }
 
 // A GIF left unfinished (after a failure) is only freed.
@@ -87,15 +90,14 @@ void GifWriter::AddFrame(const Picture& picture) {
   control.TransparentColor = NO_TRANSPARENT_COLOR;
   GifByteType extension[4];
   const std::size_t length = EGifGCBToExtension(&control, extension);
-  Check(EGifPutExtension(gif_.get(), GRAPHICS_EXT_FUNC_CODE, static_cast<int>(length), extension), "write a GIF frame");
+  Check(EGifPutExtension(gif_.get(), GRAPHICS_EXT_FUNC_CODE, static_cast<int>(length), extension));
   const int boxWidth = box.right - box.left;
-  Check(EGifPutImageDesc(gif_.get(), box.left, box.top, boxWidth, box.bottom - box.top, false, nullptr),
-        "write a GIF frame");
+  Check(EGifPutImageDesc(gif_.get(), box.left, box.top, boxWidth, box.bottom - box.top, false, nullptr));
   std::vector<GifPixelType> row(static_cast<std::size_t>(boxWidth));
   for (int y = box.top; y < box.bottom; ++y) {
     const uint8_t* source = picture.pixels.data() + static_cast<std::size_t>(y) * width_ + box.left;
     std::copy(source, source + boxWidth, row.begin());
-    Check(EGifPutLine(gif_.get(), row.data(), boxWidth), "write a GIF frame");
+    Check(EGifPutLine(gif_.get(), row.data(), boxWidth));
   }
   previous_ = picture.pixels;
 }
@@ -104,13 +106,15 @@ void GifWriter::Finish() {
   int error = 0;
   // EGifCloseFile frees the GIF whatever it returns.
   const int result = EGifCloseFile(gif_.release(), &error);
-  if (result != GIF_OK) throw std::runtime_error(std::string("cannot finish the GIF: ") + GifErrorString(error));
+  if (result != GIF_OK) Fail(GifErrorString(error));
 }
 
-void GifWriter::Check(int result, const char* what) {
-  if (result != GIF_OK) {
-    throw std::runtime_error(std::string("cannot ") + what + ": " + GifErrorString(gif_->Error));
-  }
+void GifWriter::Check(int result) {
+  if (result != GIF_OK) Fail(GifErrorString(gif_->Error));
+}
+
+void GifWriter::Fail(const char* reason) const {
+  throw std::runtime_error("cannot write " + tool_input::Shown(name_) + ": " + reason);
 }
 
 }  // namespace scene_player

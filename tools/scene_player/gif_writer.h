@@ -4,6 +4,7 @@
 
 #include <cstdio>
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "frame_renderer.h"
@@ -16,8 +17,8 @@ namespace scene_player {
 class GifWriter {
  public:
   // Writes the header, the palette and the loop marker. `delay` is in
-  // hundredths of a second per frame.
-  GifWriter(std::FILE* file, int width, int height, const std::vector<Colour>& palette, int delay);
+  // hundredths of a second per frame; `name` names the file in messages.
+  GifWriter(std::FILE* file, std::string name, int width, int height, const std::vector<Colour>& palette, int delay);
   GifWriter(const GifWriter&) = delete;
   GifWriter& operator=(const GifWriter&) = delete;
 
@@ -28,11 +29,13 @@ class GifWriter {
   void Finish();
 
  private:
-  void Check(int result, const char* what);
+  void Check(int result);
+  [[noreturn]] void Fail(const char* reason) const;
 
   struct Closer {
     void operator()(GifFileType* gif) const;
   };
+  std::string name_;
   std::unique_ptr<GifFileType, Closer> gif_;
   int width_, height_, delay_;
   std::vector<uint8_t> previous_;

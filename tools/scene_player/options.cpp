@@ -2,21 +2,39 @@
 
 #include <charconv>
 
+#include "png_names.h"
+#include "shown_text.h"
+
 namespace scene_player {
 
 const char* const kUsage =
-    "usage: scene_player [SCENE.json] [--gif FILE] [--png FILE [--png-frame FRAMES]]... [--trace FILE]\n"
-    "                    [--frames N]\n"
+    "usage: scene_player [SCENE.json | -] [--gif FILE] [--png FILE [--png-frame FRAMES]]...\n"
+    "                    [--trace FILE] [--frames N]\n"
     "       scene_player --print-demo | --version | --help\n"
-    "Plays SCENE.json, or the embedded demo scene without one, and writes an animated GIF\n"
-    "(by default SCENE.gif in the current folder, demo.gif for the demo). --png writes\n"
-    "frames as PNG pictures: FRAMES is a frame (by default the last; frames count from 0),\n"
-    "a range A-B or A-B/STEP, or a list of these separated by commas, and FILE holds %d\n"
-    "or %04d for the frame number when it names several. --trace writes a JSON line per\n"
-    "frame, --frames N plays only the first N frames. FILE may be - for standard output.\n"
-    "--print-demo prints the demo scene, a starting point for a scene of your own.\n";
+    "Plays SCENE.json (- reads it from standard input), or the embedded demo scene without\n"
+    "one, and writes an animated GIF (by default SCENE.gif in the current folder, demo.gif\n"
+    "for the demo, scene.gif for standard input). --png writes frames as PNG pictures:\n"
+    "FRAMES is a frame (by default the last; frames count from 0), a range A-B or A-B/STEP,\n"
+    "or a list of these separated by commas, and FILE holds %d, %04d or another printf\n"
+    "width where the frame number goes when it names several (%% is a %). --trace writes a\n"
+    "JSON line per frame, --frames N plays only the first N frames. FILE may be - for\n"
+    "standard output. --print-demo prints the demo scene, a starting point for your own.\n"
+    "Options take their value as --name VALUE or --name=VALUE; -- ends the options.\n"
+    "The scene format, the warnings and the trace are described in docs/scene-format.md.\n"
+    "Exit status: 0 played and written, 1 a failure while playing or writing (no file is\n"
+    "left), 2 bad input: the command line or the scene.\n";
 
 namespace {
+
+using tool_input::OptionSpec;
+using tool_input::Shown;
+using Takes = OptionSpec::Takes;
+
+constexpr OptionSpec kOptions[] = {
+    {"--gif", Takes::OneValue},        {"--png", Takes::Values},     {"--png-frame", Takes::Values},
+    {"--trace", Takes::OneValue},      {"--frames", Takes::OneValue}, {"--print-demo"},
+    {"--version"},                     {"--help", Takes::Nothing, false, "-h"},
+};
 
 // A whole number from `text`, all of it (a '-' but no '+' or blank); nothing
 // when it is not one.
@@ -29,7 +47,7 @@ std::optional<long> Number(const std::string& text) {
 }
 
 std::vector<FrameRange> ReadFrames(const std::string& text) {
-  const UsageError error("--png-frame " + text + ": expected a frame number, a range A-B or A-B/STEP, "
+  const UsageError error("--png-frame " + Shown(text) + ": expected a frame number, a range A-B or A-B/STEP, "
                          "or a list of these separated by commas");
   std::vector<FrameRange> ranges;
   std::size_t start = 0;
@@ -55,109 +73,89 @@ std::vector<FrameRange> ReadFrames(const std::string& text) {
   }
 }
 
-// Where the frame number goes in a --png name: "%d" or "%0Nd" (N from 1 to
-// 9). The position and the length of the placeholder, and its width.
-struct Placeholder {
-  std::size_t at = std::string::npos, length = 0;
-  int width = 0;
-};
-
-Placeholder FindPlaceholder(const std::string& name) {
-  for (std::size_t at = name.find('%'); at != std::string::npos; at = name.find('%', at + 1)) {
-    if (name.compare(at, 2, "%d") == 0) return {at, 2, 0};
-    if (at + 3 < name.size() && name[at + 1] == '0' && name[at + 2] >= '1' && name[at + 2] <= '9' &&
-        name[at + 3] == 'd') {
-      return {at, 4, name[at + 2] - '0'};
-    }
-  }
-  return {};
+std::string DefaultGif(const std::string& scene) {
+  if (scene.empty()) return "demo.gif";
+  if (scene == "-") return "scene.gif";
+  std::string stem = scene.substr(scene.rfind('/') + 1);
+  if (const auto dot = stem.rfind('.'); dot != std::string::npos && dot > 0) stem.resize(dot);
+  return stem + ".gif";
 }
 
 }  // namespace
 
-Options ReadOptions(int argc, char** argv) {
+Options ReadOptions(int argc, const char* const* argv) {
   Options options;
-  for (int i = 1; i < argc; ++i) {
-    const std::string arg = argv[i];
-    auto value = [&]() -> std::string {
-      if (i + 1 >= argc) throw UsageError(arg + " needs a value");
-      return argv[++i];
-    };
-    if (arg == "--gif") {
-      options.gif = value();
-    } else if (arg == "--png") {
-      options.pngs.push_back({value(), {}});
-    } else if (arg == "--trace") {
-      options.trace = value();
-    } else if (arg == "--png-frame") {
-      const std::string text = value();
-      if (options.pngs.empty()) throw UsageError("--png-frame " + text + ": expected after the --png FILE it is for");
-      if (!options.pngs.back().frames.empty()) {
-        throw UsageError("--png-frame " + text + ": --png " + options.pngs.back().name +
+  for (const tool_input::Argument& argument : tool_input::ReadCommandLine(argc, argv, kOptions)) {
+    const std::string& option = argument.option;
+    const std::string& value = argument.value;
+    if (option == "--gif") {
+      options.gif = value;
+    } else if (option == "--png") {
+      static_cast<void>(PngName(value));  // a bad pattern is said at once
+      options.pngs.push_back({value, "", {}});
+    } else if (option == "--trace") {
+      options.trace = value;
+    } else if (option == "--png-frame") {
+      if (options.pngs.empty()) throw UsageError("--png-frame " + Shown(value) + ": expected after the --png FILE it is for");
+      PngRequest& png = options.pngs.back();
+      if (!png.frames.empty()) {
+        throw UsageError("--png-frame " + Shown(value) + ": --png " + Shown(png.name) +
                          " already has its frames; expected one --png-frame for each --png");
       }
-      options.pngs.back().frames = ReadFrames(text);
-    } else if (arg == "--frames") {
-      const std::string text = value();
-      options.frames = Number(text);
-      if (!options.frames || *options.frames < 1) throw UsageError("--frames " + text + ": expected a number of frames, 1 or more");
-    } else if (arg == "--print-demo") {
+      png.framesText = value;
+      png.frames = ReadFrames(value);
+    } else if (option == "--frames") {
+      options.frames = Number(value);
+      if (!options.frames || *options.frames < 1) {
+        throw UsageError("--frames " + Shown(value) + ": expected a number of frames, 1 or more");
+      }
+    } else if (option == "--print-demo") {
       options.printDemo = true;
-    } else if (arg == "--version") {
+    } else if (option == "--version") {
       options.version = true;
-    } else if (arg == "--help" || arg == "-h") {
+    } else if (option == "--help") {
       options.help = true;
-    } else if (!arg.empty() && arg[0] == '-') {
-      throw UsageError("unknown option " + arg);
     } else if (options.scene.empty()) {
-      options.scene = arg;
+      options.scene = value;
     } else {
-      throw UsageError("one scene at a time: " + options.scene + " and " + arg);
+      throw UsageError("one scene at a time: " + Shown(options.scene) + " and " + Shown(value));
     }
   }
-  if (options.gif.empty()) {
-    std::string stem = "demo";
-    if (!options.scene.empty()) {
-      stem = options.scene.substr(options.scene.rfind('/') + 1);
-      if (const auto dot = stem.rfind('.'); dot != std::string::npos && dot > 0) stem.resize(dot);
-    }
-    options.gif = stem + ".gif";
+  if (options.printDemo && (!options.scene.empty() || !options.gif.empty() || !options.trace.empty() ||
+                            !options.pngs.empty() || options.frames)) {
+    throw UsageError("--print-demo prints the demo scene and plays nothing; expected no scene, output or --frames "
+                     "with it");
   }
+  if (options.gif.empty()) options.gif = DefaultGif(options.scene);
   return options;
 }
 
 std::vector<PngOutput> PngOutputs(const std::vector<PngRequest>& requests, int frames) {
   std::vector<PngOutput> outputs;
   for (const PngRequest& request : requests) {
+    const std::string option = "--png-frame " + Shown(request.framesText);
     std::vector<int> asked;
+    std::vector<bool> seen(static_cast<std::size_t>(frames));
     for (const FrameRange& range : request.frames) {
       if (range.first < 0 || range.last >= frames) {
-        const std::string text = range.first == range.last ? std::to_string(range.first)
-                                                            : std::to_string(range.first) + "-" + std::to_string(range.last);
-        throw UsageError("--png-frame " + text + ": expected a frame from 0 to " + std::to_string(frames - 1));
+        throw UsageError(option + ": expected frames from 0 to " + std::to_string(frames - 1));
       }
       for (long frame = range.first;; frame += range.step) {
+        if (seen[static_cast<std::size_t>(frame)]) {
+          throw UsageError(option + ": frame " + std::to_string(frame) + " is listed twice");
+        }
+        seen[static_cast<std::size_t>(frame)] = true;
         asked.push_back(static_cast<int>(frame));
         if (range.last - frame < range.step) break;
       }
     }
     if (asked.empty()) asked.push_back(frames - 1);
-    const Placeholder placeholder = FindPlaceholder(request.name);
-    if (asked.size() > 1 && placeholder.length == 0) {
-      throw UsageError("--png " + request.name + ": " + std::to_string(asked.size()) +
+    const PngName name(request.name);
+    if (asked.size() > 1 && !name.numbered()) {
+      throw UsageError("--png " + Shown(request.name) + ": " + std::to_string(asked.size()) +
                        " frames for one file name; expected %d or %04d in the name for the frame number");
     }
-    for (int frame : asked) {
-      std::string path = request.name;
-      if (placeholder.length > 0) {
-        std::string number = std::to_string(frame);
-        if (number.size() < static_cast<std::size_t>(placeholder.width)) {
-          number.insert(0, static_cast<std::size_t>(placeholder.width) - number.size(), '0');
-        }
-        path.replace(placeholder.at, placeholder.length, number);
-      }
-      outputs.push_back({frame, path});
-    }
+    for (int frame : asked) outputs.push_back({frame, name.For(frame)});
   }
   return outputs;
 }

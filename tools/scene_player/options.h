@@ -2,32 +2,32 @@
 #pragma once
 
 #include <optional>
-#include <stdexcept>
 #include <string>
 #include <vector>
 
+#include "command_line.h"
+
 namespace scene_player {
 
-extern const char* const kUsage;
+using tool_input::UsageError;
 
-class UsageError : public std::runtime_error {
-  using std::runtime_error::runtime_error;
-};
+extern const char* const kUsage;
 
 // Frames first to last (inclusive), every `step`-th.
 struct FrameRange {
   long first = 0, last = 0, step = 1;
 };
 
-// One --png: a file name, with "%d" or "%0Nd" standing for the frame number
-// when it names several files, and the frames it asks for (none: the last).
+// One --png: a file name (a PngName pattern) and the frames it asks for, as
+// given (none: the last).
 struct PngRequest {
   std::string name;
+  std::string framesText;
   std::vector<FrameRange> frames;
 };
 
 struct Options {
-  std::string scene;  // empty: the embedded demo
+  std::string scene;  // empty: the embedded demo; "-": standard input
   std::string gif, trace;
   std::vector<PngRequest> pngs;
   std::optional<long> frames;  // --frames: play only this many
@@ -37,7 +37,7 @@ struct Options {
 };
 
 // Throws UsageError for a command line the player cannot follow.
-Options ReadOptions(int argc, char** argv);
+Options ReadOptions(int argc, const char* const* argv);
 
 struct PngOutput {
   int frame;
@@ -45,8 +45,8 @@ struct PngOutput {
 };
 
 // Every PNG file the run writes, in the order of the command line, for a run
-// of `frames` frames. Throws UsageError for a frame outside the run or a name
-// that would be given to several frames.
+// of `frames` frames. Throws UsageError for a frame outside the run, a frame
+// asked for twice, or a name that would be given to several frames.
 std::vector<PngOutput> PngOutputs(const std::vector<PngRequest>& requests, int frames);
 
 }  // namespace scene_player

@@ -8,6 +8,7 @@
 #include <string>
 #include <utility>
 
+#include "addressing.h"
 #include "chains/float_math.h"
 #include "event_names.h"
 
@@ -49,6 +50,7 @@ Player::Player(const Scene& scene) : scene_(scene), host_(SettingsRecord(scene.s
   if (!host_.created()) throw std::runtime_error("the library refused to create its run-time object");
   CheckRoutines();
   objects_.resize(scene_.objects.size());
+  bearers_.assign(scene_.objects.size(), -1);
   for (std::size_t i = 0; i < scene_.objects.size(); ++i) {
     if (scene_.objects[i].atStart) Create(i);
   }
@@ -90,6 +92,7 @@ void Player::Create(std::size_t index) {
   target.exactX = spec.x;
   target.exactY = spec.y;
   indexes_[target.object] = static_cast<int>(index);
+  bearers_[static_cast<std::size_t>(spec.firstOfName)] = static_cast<int>(index);
 }
 
 void Player::Forget(std::size_t index) {
@@ -122,8 +125,19 @@ void Player::PlayFrame(int frame) {
 const HostObject* Player::live(std::size_t index) const { return Live(static_cast<int>(index)); }
 
 HostObject* Player::Live(int index) const {
+  if (index < 0) return nullptr;
   const ObjectState& target = objects_[static_cast<std::size_t>(index)];
   return target.state == State::Live ? target.object : nullptr;
+}
+
+int Player::Bearer(int index) const {
+  return bearers_[static_cast<std::size_t>(scene_.objects[static_cast<std::size_t>(index)].firstOfName)];
+}
+
+void Player::WarnOnce(int code, bool expression, const std::string& missed) {
+  if (missed.empty()) return;
+  const std::string key = running_->place + (expression ? " expression " : " action ") + std::to_string(code);
+  if (warned_.insert(key).second) warnings_.push_back(running_->place + ": " + missed);
 }
 
 int Player::IndexOf(const HostObject* object) const {
@@ -152,6 +166,7 @@ void Player::RunSteps(const std::vector<Step>& steps) {
 // A step whose object is not on the frame at that moment does nothing, as an
 // event of the host does when no instance of its object exists.
 void Player::RunStep(const Step& step) {
+  running_ = &step;
   switch (step.kind) {
     case Step::Kind::Action:
       RunAction(step);
@@ -160,14 +175,14 @@ void Player::RunStep(const Step& step) {
       Create(static_cast<std::size_t>(step.object));
       return;
     case Step::Kind::Destroy:
-      if (HostObject* object = Live(step.object)) {
+      if (const int bearer = Bearer(step.object); HostObject* object = Live(bearer)) {
         host_.Destroy(object);
-        objects_[static_cast<std::size_t>(step.object)].state = State::Destroyed;
+        objects_[static_cast<std::size_t>(bearer)].state = State::Destroyed;
       }
       return;
     case Step::Kind::MoveTo:
     case Step::Kind::MoveBy:
-      if (Live(step.object)) Move(objects_[static_cast<std::size_t>(step.object)], step);
+      if (const int bearer = Bearer(step.object); Live(bearer)) Move(objects_[static_cast<std::size_t>(bearer)], step);
       return;
     case Step::Kind::Enable:
     case Step::Kind::Disable:
@@ -179,13 +194,14 @@ void Player::RunStep(const Step& step) {
 void Player::RunAction(const Step& step) {
   const ActionName& action = kActionNames[step.action];
   if (action.paramCount > 0 && action.kinds[0] == ParamKind::Object) {
-    HostObject* object = Live(step.object);
+    HostObject* object = Live(Bearer(step.object));
     if (object != nullptr) host_.Action(step.action, reinterpret_cast<intptr_t>(object));
     return;
   }
   // The host evaluates the parameters in order before it calls the routine.
   const int32_t first = step.values.empty() ? 0 : ToInteger(Evaluate(step.values[0]));
   const double second = step.values.size() > 1 ? Evaluate(step.values[1]) : 0.0;
+  WarnOnce(step.action, false, MissedByAction(*extension_, step.action, first));
   if (action.paramCount == 2 && action.kinds[1] == ParamKind::Float) {
     host_.ActionWithValue(step.action, first, RoundToFloat(second));
   } else {
@@ -219,6 +235,7 @@ double Player::Evaluate(const Value& value) {
   if (value.expression < 0) return value.number;
   int32_t params[2] = {0, 0};
   for (std::size_t i = 0; i < value.params.size() && i < 2; ++i) params[i] = ToInteger(Evaluate(value.params[i]));
+  WarnOnce(value.expression, true, MissedByExpression(*extension_, value.expression, params));
   int32_t result = 0;
   switch (value.params.size()) {
     case 0: result = host_.Expression(value.expression); break;

@@ -8,6 +8,8 @@
 #include <exception>
 #include <functional>
 #include <queue>
+#include <set>
+#include <string>
 #include <unordered_map>
 #include <utility>
 #include <vector>
@@ -38,6 +40,10 @@ class Player {
   // this frame, which stay readable until its handle call has run.
   int IndexOf(const HostObject* object) const;
 
+  // What the steps run since the last call addressed that did not exist
+  // ("PLACE: message"), each step and routine said once in the run.
+  std::vector<std::string> TakeWarnings() { return std::exchange(warnings_, {}); }
+
  private:
   enum class State { NotYet, Live, Destroyed, Gone };
   struct ObjectState {
@@ -59,18 +65,25 @@ class Player {
   double Evaluate(const Value& value);
   void OnEvent(int32_t code);
   HostObject* Live(int index) const;
+  // The scene object on the frame that bears the name of object `index`, or -1.
+  int Bearer(int index) const;
+  void WarnOnce(int code, bool expression, const std::string& missed);
 
   const Scene& scene_;
   standin::Host host_;
   const RunData* extension_;
   std::vector<ObjectState> objects_;
   std::unordered_map<const HostObject*, int> indexes_;  // of the objects in objects_
+  std::vector<int> bearers_;  // by ObjectSpec::firstOfName: the object of that name last created
   std::vector<bool> rulesEnabled_;
   // When each timeline entry runs next: (frame, entry), earliest first, and
   // in the order of the file within a frame.
   std::priority_queue<std::pair<int, std::size_t>, std::vector<std::pair<int, std::size_t>>, std::greater<>> due_;
   int frame_ = 0;       // the frame being played, for {"count": "frame"}
   int repetition_ = 0;  // of the repeating entry being run, for {"count": "repetition"}
+  const Step* running_ = nullptr;  // the step being run, for its warnings
+  std::vector<std::string> warnings_;
+  std::set<std::string> warned_;
   // An exception must not cross the library's swing step: one thrown while
   // a rule runs is kept here and rethrown once the frame is over.
   std::exception_ptr eventFailure_;

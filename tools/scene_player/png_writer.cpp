@@ -4,6 +4,8 @@
 #include <png.h>
 #include <stdexcept>
 
+#include "shown_text.h"
+
 namespace scene_player {
 
 namespace {
@@ -32,14 +34,16 @@ bool WriteRows(std::FILE* file, const Picture& picture, const std::vector<png_co
 
 }  // namespace
 
-void WritePng(std::FILE* file, const Picture& picture, const std::vector<Colour>& palette) {
+void WritePng(std::FILE* file, const std::string& name, const Picture& picture, const std::vector<Colour>& palette) {
   std::vector<png_color> colours;
   for (const Colour& colour : palette) colours.push_back({colour.r, colour.g, colour.b});
   std::vector<png_bytep> rows;
   // libpng takes non-const rows but only reads them when writing.
   auto* pixels = const_cast<uint8_t*>(picture.pixels.data());
   for (int y = 0; y < picture.height; ++y) rows.push_back(pixels + static_cast<std::size_t>(y) * picture.width);
-  if (!WriteRows(file, picture, colours, rows)) throw std::runtime_error("cannot write the PNG picture");
+  if (!WriteRows(file, picture, colours, rows)) {
+    throw std::runtime_error("cannot write " + tool_input::Shown(name) + ": the PNG library failed");
+  }
 }
 
 }  // namespace scene_player

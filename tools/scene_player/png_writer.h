@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdio>
+#include <string>
 #include <vector>
 
 #include "frame_renderer.h"
@@ -9,7 +10,8 @@
 
 namespace scene_player {
 
-// Throws std::runtime_error when the picture cannot be written.
-void WritePng(std::FILE* file, const Picture& picture, const std::vector<Colour>& palette);
+// Throws std::runtime_error, naming the file by `name`, when the picture
+// cannot be written.
+void WritePng(std::FILE* file, const std::string& name, const Picture& picture, const std::vector<Colour>& palette);
 
 }  // namespace scene_player

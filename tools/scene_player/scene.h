@@ -32,6 +32,10 @@ struct ObjectSpec {
   int16_t idLow = 0;
   uint16_t idHigh = 0;
   bool atStart = true;  // false: created later by a "create" step
+  // The first object of the scene with this name: a name freed by "destroy"
+  // may be given to a later "create", and a step then means whichever of
+  // them is on the frame.
+  int firstOfName = 0;
 };
 
 // A number given in the scene, an expression of the library evaluated each

@@ -10,7 +10,9 @@
 #include <nlohmann/json.hpp>
 
 #include "event_names.h"
+#include "json_document.h"
 #include "palette.h"
+#include "shown_text.h"
 
 namespace scene_player {
 
@@ -29,15 +31,7 @@ constexpr std::size_t kSettingTextLength = 9;  // the stored field holds 9 chara
   throw SceneError(place.empty() ? "top level" : place, message);
 }
 
-std::string Member(const std::string& place, const char* key) {
-  return place.empty() ? key : place + "." + key;
-}
-
-std::string Element(const std::string& place, std::size_t index) {
-  return place + "[" + std::to_string(index) + "]";
-}
-
-std::string Quoted(std::string_view text) { return json(std::string(text)).dump(); }
+std::string Quoted(std::string_view text) { return "\"" + tool_input::Shown(text) + "\""; }
 
 // How a value found in the file is named in a message.
 std::string Described(const json& value) {
@@ -46,7 +40,7 @@ std::string Described(const json& value) {
     case json::value_t::array: return "an array";
     case json::value_t::string: {
       const auto& text = value.get_ref<const std::string&>();
-      return "the text " + Quoted(text.size() > 40 ? text.substr(0, 40) + "..." : text);
+      return "the text " + Quoted(text);
     }
     case json::value_t::boolean: return value.get<bool>() ? "true" : "false";
     case json::value_t::null: return "null";
@@ -268,16 +262,22 @@ ObjectSpec Reader::ReadObject(const json& value, const std::string& place, bool 
   return spec;
 }
 
+// A name is free again once the timeline has destroyed its object, so that a
+// rebuild may use the names it had.
 void Reader::Define(ObjectSpec spec) {
   NameState& state = names_[spec.name];
-  if (state.object >= 0) {
+  if (state.object >= 0 && state.destroyedAt.empty()) {
     Fail(Member(spec.place, "name"), "the name " + Quoted(spec.name) + " is already taken by " +
-                                         scene_.objects[state.object].place + "; expected a name of its own");
+                                         scene_.objects[state.object].place +
+                                         "; expected a name of its own, or a \"destroy\" of that object first");
   }
   if (scene_.objects.size() >= kMaxObjects) {
     Fail(spec.place, "too many objects; expected at most " + std::to_string(kMaxObjects));
   }
-  state.object = static_cast<int>(scene_.objects.size());
+  const int index = static_cast<int>(scene_.objects.size());
+  spec.firstOfName = state.object >= 0 ? scene_.objects[state.object].firstOfName : index;
+  state.object = index;
+  state.destroyedAt.clear();
   scene_.objects.push_back(std::move(spec));
 }
 
@@ -592,60 +592,10 @@ Value Reader::ReadCount(const json& value, const std::string& place, Where where
   return result;
 }
 
-// Line and column (from 1) of a byte offset, for text that is not JSON.
-std::string LineAndColumn(std::string_view text, std::size_t offset) {
-  offset = std::min(offset, text.size());
-  const std::string_view before = text.substr(0, offset);
-  const std::size_t line = static_cast<std::size_t>(std::count(before.begin(), before.end(), '\n')) + 1;
-  const std::size_t lineStart = before.rfind('\n');
-  const std::size_t column = offset - (lineStart == std::string_view::npos ? 0 : lineStart + 1) + 1;
-  return "line " + std::to_string(line) + ", column " + std::to_string(column);
-}
-
-// Builds the document as json::parse does, but keeps where a failure was
-// found: the parser's own exception for a number too large for a double
-// carries no position. (The parser calls these members of the type it is
-// given, so hiding the base class's member is enough.)
-class DocumentBuilder : public nlohmann::detail::json_sax_dom_parser<json> {
- public:
-  explicit DocumentBuilder(json& root) : json_sax_dom_parser(root, false) {}
-
-  bool parse_error(std::size_t position, const std::string& token, const nlohmann::detail::exception& error) {
-    failed = true;
-    end = position;
-    lastToken = token;
-    id = error.id;
-    message = error.what();
-    return false;
-  }
-
-  bool failed = false;
-  std::size_t end = 0;  // bytes read when it failed
-  std::string lastToken;
-  int id = 0;
-  std::string message;
-};
-
-constexpr int kNumberOverflow = 406;  // the parser's error id for a number beyond a double
-
 }  // namespace
 
-Scene ParseScene(std::string_view text) {
-  json root;
-  DocumentBuilder builder(root);
-  if (!json::sax_parse(text, &builder) || builder.failed) {
-    if (builder.id == kNumberOverflow) {
-      const std::size_t start = builder.end >= builder.lastToken.size() ? builder.end - builder.lastToken.size() : 0;
-      throw SceneError(LineAndColumn(text, start), "the number " + builder.lastToken +
-                                                       " is out of range; expected a number from -1.7e308 to 1.7e308");
-    }
-    // The parser's message repeats the position; keep what it found and expected.
-    std::string message = builder.message;
-    const auto at = message.find(": ", message.find("column"));
-    if (at != std::string::npos) message = message.substr(at + 2);
-    throw SceneError(LineAndColumn(text, builder.end > 0 ? builder.end - 1 : 0), "not JSON: " + message);
-  }
-  return Reader().Read(root);
+Scene ParseScene(std::string_view text, std::vector<std::string>& warnings) {
+  return Reader().Read(ReadJsonDocument(text, warnings));
 }
 
 }  // namespace scene_player

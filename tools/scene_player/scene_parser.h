@@ -5,6 +5,7 @@
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "scene.h"
 
@@ -23,7 +24,9 @@ class SceneError : public std::runtime_error {
   std::string place_;
 };
 
-// Throws SceneError for the first fault found.
-Scene ParseScene(std::string_view text);
+// Throws SceneError for the first fault found. What is not a fault but
+// likely a slip (a key given twice in one object) is added to `warnings`,
+// each "PLACE: message".
+Scene ParseScene(std::string_view text, std::vector<std::string>& warnings);
 
 }  // namespace scene_player
