@@ -8,9 +8,9 @@ packages=(
   clang libclang-rt-14-dev
   gcc-multilib g++-multilib qemu-user-static
   g++-mingw-w64-i686 g++-mingw-w64-x86-64 binutils-mingw-w64-i686 binutils-mingw-w64-x86-64
-  wine wine64 xvfb xauth
+  wine wine64 fonts-wine xvfb xauth
   libgif-dev libpng-dev nlohmann-json3-dev libcairo2-dev fonts-dejavu-core
-  python3
+  python3 python3-markdown
   libbox2d-dev
 )
 missing=()

@@ -57,6 +57,17 @@ void StoreSettings(HWND dialog, EditData& edit) {
   edit.viewTemplate = IsDlgButtonChecked(dialog, IDC_VIEW_TEMPLATE) == BST_CHECKED ? 1 : 0;
 }
 
+// A short help in a message box that the dialog owns, so that the dialog
+// waits for it; its texts come from the string table. The settings are
+// neither read nor stored.
+void ShowHelp(HWND dialog) {
+  char caption[64] = "";
+  char text[1024] = "";
+  LoadStringA(TavrinModule(), IDS_SETUP_HELP_CAPTION, caption, sizeof caption);
+  LoadStringA(TavrinModule(), IDS_SETUP_HELP_TEXT, text, sizeof text);
+  MessageBoxA(dialog, text, caption, MB_OK | MB_ICONINFORMATION);
+}
+
 }  // namespace
 
 INT_PTR CALLBACK SetupDialogProc(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) noexcept {
@@ -77,7 +88,10 @@ INT_PTR CALLBACK SetupDialogProc(HWND dialog, UINT message, WPARAM wParam, LPARA
     case IDCANCEL:  // also what the Escape key sends
       EndDialog(dialog, -1);
       break;
-    default:  // "Help" and every notification: the dialog stays as it is
+    case IDC_SETUP_HELP:
+      if (HIWORD(wParam) == BN_CLICKED) ShowHelp(dialog);
+      break;
+    default:  // the edits' notifications: the dialog stays as it is
       break;
   }
   return FALSE;

@@ -42,6 +42,10 @@
 #define IDC_VIEW_TEMPLATE 1012
 #define IDC_SETUP_HELP 20004
 
+/* The short help that the setup dialog's "Help" button shows. */
+#define IDS_SETUP_HELP_CAPTION 20005
+#define IDS_SETUP_HELP_TEXT 20006
+
 /* The object's picture: the icon of the object type, and what the frame
    editor shows while no template is viewed. */
 #define IDB_ICON 400

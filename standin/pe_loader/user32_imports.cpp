@@ -26,6 +26,7 @@ std::span<const ImportRow> User32Imports() {
       Stdcall<4>("IsWindow", &IsWindow),
       Stdcall<8>("LoadMenuA", &LoadMenuA),
       Stdcall<16>("LoadStringA", &LoadStringA),
+      Stdcall<16>("MessageBoxA", &MessageBoxA),
       Stdcall<16>("SetDlgItemInt", &SetDlgItemInt),
       Stdcall<12>("SetDlgItemTextA", &SetDlgItemTextA),
       Stdcall<12>("SetWindowLongA", &SetWindowLongA),

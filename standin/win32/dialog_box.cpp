@@ -28,9 +28,6 @@ uintptr_t g_nextHandle = 0x20000;
 HWND g_focus = nullptr;
 std::function<void(HWND)> g_author;
 
-constexpr DWORD kTabStop = 0x00010000L;  // WS_TABSTOP
-constexpr DWORD kVisible = 0x10000000L;  // WS_VISIBLE
-constexpr DWORD kDisabled = 0x08000000L;  // WS_DISABLED
 constexpr WORD kButtonClass = 0x0080, kEditClass = 0x0081, kStaticClass = 0x0082;
 
 bool SameName(const std::string& text, const char* name) {
@@ -144,13 +141,41 @@ HWND DialogItem(HWND dialog, int id) {
 
 void SetFocusTo(HWND control) { g_focus = control; }
 
+INT_PTR RunModal(HWND dialog, HWND focus) {
+  Window* window = FindWindowOf(dialog);
+  if (!window->ended) {
+    const HWND focusBefore = g_focus;
+    // An owner that is enabled is disabled while the dialog runs.
+    const HWND owner = window->parent;
+    const bool disables = IsWindowEnabled(owner) != FALSE;
+    if (disables) FindWindowOf(owner)->style |= kDisabled;
+    if (focus != nullptr) g_focus = focus;
+    window->visible = true;
+    if (g_author) g_author(dialog);
+    window = FindWindowOf(dialog);
+    if (!window->ended) {
+      // A real dialog would now wait for an author who never comes.
+      std::fprintf(stderr, "standin: the dialog \"%s\" was left open, and nothing can close it\n",
+                   window->text.c_str());
+      std::abort();
+    }
+    if (Window* stillThere = disables ? FindWindowOf(owner) : nullptr) stillThere->style &= ~kDisabled;
+    if (FindWindowOf(focusBefore) != nullptr) g_focus = focusBefore;
+  }
+  const INT_PTR result = window->result;
+  DestroyDialog(dialog);
+  return result;
+}
+
 }  // namespace standin
 
 using standin::FindWindowOf;
 using standin::Window;
 using standin::WindowKind;
 
-void StandinSetDialogAuthor(std::function<void(HWND dialog)> author) { standin::g_author = std::move(author); }
+std::function<void(HWND dialog)> StandinSetDialogAuthor(std::function<void(HWND dialog)> author) {
+  return std::exchange(standin::g_author, std::move(author));
+}
 
 INT_PTR WINAPI DialogBoxParamA(HINSTANCE hInstance, LPCSTR lpTemplateName, HWND hWndParent, DLGPROC lpDialogFunc,
                                LPARAM dwInitParam) {
@@ -170,22 +195,7 @@ INT_PTR WINAPI DialogBoxParamA(HINSTANCE hInstance, LPCSTR lpTemplateName, HWND 
   const HWND firstTabStop = standin::FirstTabStop(*FindWindowOf(dialog));
   const INT_PTR focusDefault =
       lpDialogFunc(dialog, WM_INITDIALOG, reinterpret_cast<WPARAM>(firstTabStop), dwInitParam);
-  Window* window = FindWindowOf(dialog);
-  if (!window->ended) {
-    if (focusDefault != 0) standin::SetFocusTo(standin::FirstTabStop(*window));
-    window->visible = true;
-    if (standin::g_author) standin::g_author(dialog);
-    window = FindWindowOf(dialog);
-    if (!window->ended) {
-      // A real dialog would now wait for an author who never comes.
-      std::fprintf(stderr, "standin: the dialog \"%s\" was left open, and nothing can close it\n",
-                   window->text.c_str());
-      std::abort();
-    }
-  }
-  const INT_PTR result = window->result;
-  standin::DestroyDialog(dialog);
-  return result;
+  return standin::RunModal(dialog, focusDefault != 0 ? standin::FirstTabStop(*FindWindowOf(dialog)) : nullptr);
 }
 
 BOOL WINAPI EndDialog(HWND hDlg, INT_PTR nResult) {
@@ -200,6 +210,18 @@ BOOL WINAPI EndDialog(HWND hDlg, INT_PTR nResult) {
 HWND WINAPI GetFocus(void) { return standin::g_focus; }
 
 BOOL WINAPI IsWindow(HWND hWnd) { return FindWindowOf(hWnd) != nullptr; }
+
+BOOL WINAPI IsWindowEnabled(HWND hWnd) {
+  const Window* window = FindWindowOf(hWnd);
+  return window != nullptr && (window->style & standin::kDisabled) == 0;
+}
+
+// Only a dialog has an owner; its controls are its children.
+HWND WINAPI GetWindow(HWND hWnd, UINT uCmd) {
+  const Window* window = FindWindowOf(hWnd);
+  if (window == nullptr || uCmd != GW_OWNER || window->kind != WindowKind::Dialog) return nullptr;
+  return window->parent;
+}
 
 BOOL WINAPI IsWindowVisible(HWND hWnd) {
   const Window* window = FindWindowOf(hWnd);

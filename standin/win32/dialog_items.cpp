@@ -111,11 +111,15 @@ BOOL WINAPI SetDlgItemTextA(HWND hDlg, int nIDDlgItem, LPCSTR lpString) {
   return static_cast<BOOL>(SendDlgItemMessageA(hDlg, nIDDlgItem, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(lpString)));
 }
 
+int WINAPI GetWindowTextA(HWND hWnd, LPSTR lpString, int nMaxCount) {
+  if (lpString != nullptr && nMaxCount > 0) lpString[0] = '\0';
+  if (nMaxCount <= 0) return 0;
+  return static_cast<int>(
+      SendMessageA(hWnd, WM_GETTEXT, static_cast<WPARAM>(nMaxCount), reinterpret_cast<LPARAM>(lpString)));
+}
+
 UINT WINAPI GetDlgItemTextA(HWND hDlg, int nIDDlgItem, LPSTR lpString, int cchMax) {
-  if (lpString != nullptr && cchMax > 0) lpString[0] = '\0';
-  if (cchMax <= 0) return 0;
-  return static_cast<UINT>(SendDlgItemMessageA(hDlg, nIDDlgItem, WM_GETTEXT, static_cast<WPARAM>(cchMax),
-                                               reinterpret_cast<LPARAM>(lpString)));
+  return static_cast<UINT>(GetWindowTextA(GetDlgItem(hDlg, nIDDlgItem), lpString, cchMax));
 }
 
 // USER32 reports success whether or not the item exists.

@@ -10,11 +10,15 @@
 
 namespace standin {
 
+constexpr DWORD kTabStop = 0x00010000L;   // WS_TABSTOP
+constexpr DWORD kVisible = 0x10000000L;   // WS_VISIBLE
+constexpr DWORD kDisabled = 0x08000000L;  // WS_DISABLED
+
 enum class WindowKind { Dialog, PushButton, DefPushButton, CheckBox, AutoCheckBox, GroupBox, Edit, Static };
 
 struct Window {
   WindowKind kind = WindowKind::Dialog;
-  HWND parent = nullptr;  // the dialog, for a control
+  HWND parent = nullptr;  // the dialog, for a control; the owner, for a dialog
   int id = 0;
   DWORD style = 0;
   std::string text;
@@ -43,5 +47,12 @@ HWND DialogItem(HWND dialog, int id);
 
 // Which control has the keyboard focus (null for none).
 void SetFocusTo(HWND control);
+
+// Runs a dialog that its procedure has initialised until EndDialog, as
+// USER32's modal loop does: shown, with the focus on `focus` (unless null)
+// and its owner disabled, while the author acts; then the owner is enabled
+// again, the focus goes back where it was, and the dialog is destroyed.
+// What EndDialog was given.
+INT_PTR RunModal(HWND dialog, HWND focus);
 
 }  // namespace standin

@@ -81,7 +81,7 @@ TEST(EditorDisplay, ShowsThePictureOrNothingAsTheSettingsSay) {
   }
 }
 
-TEST(EditorDisplay, DrawsTheTemplateOfTheDefaults) {
+TEST(EditorDisplay, DrawsTheTemplateWithItsSizes) {
   EditData edit = Defaults(1);
   RECT rect = Place(0, 0);
   const std::string args = " 1 0 0 1 0 0 0 0 0 8";
@@ -100,6 +100,18 @@ TEST(EditorDisplay, DrawsTheTemplateOfTheDefaults) {
   }));
   EXPECT_EQ(edit.objectWidth, 768);
   EXPECT_EQ(edit.objectHeight, 736);
+
+  // An anchor and a platform that are not square: no width stands in for a height.
+  edit.anchorWidth = 20;
+  edit.anchorHeight = 50;
+  edit.platformWidth = 80;
+  edit.platformHeight = 24;
+  const Calls calls = Display(nullptr, edit, rect);
+  ASSERT_GE(calls.size(), 5u);
+  EXPECT_EQ(Calls(calls.begin() + 1, calls.begin() + 5),
+            (Calls{"Rectangle editor 382 339 402 389 255 0 0 1", "DrawText editor \"(382,339)\" -1 382 339 422 439" + args,
+                   "Rectangle editor 704 352 784 376 255 0 0 1",
+                   "DrawText editor \"(744,364)\" -1 664 352 824 400" + args}));
 }
 
 TEST(EditorDisplay, TemplateSettingsSetTheRadiusAndTheSwing) {

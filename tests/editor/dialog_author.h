@@ -25,7 +25,7 @@ using Author = std::function<void(HWND dialog)>;
 constexpr INT_PTR kLeftOpen = 12345;
 
 inline std::string ReadText(HWND dialog, int id) {
-  char text[256] = "";
+  char text[2048] = "";
   GetDlgItemTextA(dialog, id, text, sizeof text);
   return text;
 }
@@ -43,12 +43,17 @@ inline void PressKey(HWND dialog, WPARAM key) {
 
 namespace detail {
 
-inline Author g_author;
-inline int g_dialogsShown = 0;
+// Who acts at the dialogs a call shows, and how many came up.
+struct Hand {
+  Author author;
+  int shown = 0;
+};
+inline Hand g_atDialog, g_atBox;
 
+template <Hand& hand>
 inline void Act(HWND dialog) {
-  ++g_dialogsShown;
-  g_author(dialog);
+  ++hand.shown;
+  hand.author(dialog);
   if (IsWindowVisible(dialog)) {
     ADD_FAILURE() << "the author left the dialog open";
     EndDialog(dialog, kLeftOpen);
@@ -64,33 +69,47 @@ inline BOOL CALLBACK FindDialog(HWND window, LPARAM found) {
   return FALSE;
 }
 // The modal loop dispatches the thread's timer: once the dialog is shown,
-// the author takes over.
+// the author takes over. Windows are found from the top, and an owned
+// window lies above its owner: a message box comes before its dialog.
+template <Hand& hand>
 inline void CALLBACK OnTimer(HWND, UINT, UINT_PTR timer, DWORD) {
   HWND dialog = nullptr;
   EnumThreadWindows(GetCurrentThreadId(), FindDialog, reinterpret_cast<LPARAM>(&dialog));
   if (dialog == nullptr) return;
   KillTimer(nullptr, timer);
-  Act(dialog);
+  Act<hand>(dialog);
 }
 #endif
+
+// Makes the call `open`, with `author` at each dialog it shows; the number
+// of dialogs shown.
+template <Hand& hand>
+inline int Run(Author author, const std::function<void()>& open) {
+  hand = Hand{std::move(author), 0};
+#if defined(_WIN32)
+  const UINT_PTR timer = SetTimer(nullptr, 0, 10, OnTimer<hand>);
+  open();
+  KillTimer(nullptr, timer);
+#else
+  auto before = StandinSetDialogAuthor(Act<hand>);
+  open();
+  StandinSetDialogAuthor(std::move(before));
+#endif
+  return hand.shown;
+}
 
 }  // namespace detail
 
 // Makes the call `open`, with `author` at each dialog it shows; the number
 // of dialogs shown.
 inline int WithAuthor(Author author, const std::function<void()>& open) {
-  detail::g_author = std::move(author);
-  detail::g_dialogsShown = 0;
-#if defined(_WIN32)
-  const UINT_PTR timer = SetTimer(nullptr, 0, 10, detail::OnTimer);
-  open();
-  KillTimer(nullptr, timer);
-#else
-  StandinSetDialogAuthor(detail::Act);
-  open();
-  StandinSetDialogAuthor(nullptr);
-#endif
-  return detail::g_dialogsShown;
+  return detail::Run<detail::g_atDialog>(std::move(author), open);
+}
+
+// Clicks button `id` of `dialog`, with `answer` at the message box that the
+// click shows; the number of boxes shown.
+inline int ClickIntoMessageBox(HWND dialog, int id, Author answer) {
+  return detail::Run<detail::g_atBox>(std::move(answer), [&] { Click(dialog, id); });
 }
 
 }  // namespace editor_test

@@ -10,6 +10,7 @@
 #include <cstdint>
 #include <cstring>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include "catalogue/catalogue_helpers.h"
@@ -84,7 +85,22 @@ editor_test::Author ReadThenPress(std::string& shown, std::vector<Press> presses
     shown = Shown(dialog);
     for (std::size_t i = 0; i < presses.size(); ++i) {
       const Press& p = presses[i];
-      p.key ? editor_test::PressKey(dialog, static_cast<WPARAM>(p.code)) : editor_test::Click(dialog, p.code);
+      if (!p.key && p.code == IDC_SETUP_HELP) {
+        // The string table's help, in a box that the dialog owns and that
+        // keeps it disabled until OK is pressed.
+        char caption[64] = "", text[2048] = "", help[2048] = "";
+        LoadStringA(TavrinModule(), IDS_SETUP_HELP_TEXT, help, sizeof help);
+        editor_test::ClickIntoMessageBox(dialog, IDC_SETUP_HELP, [&](HWND box) {
+          GetWindowTextA(box, caption, sizeof caption);
+          GetDlgItemTextA(box, 0xFFFF, text, sizeof text);  // the static control of the text
+          EXPECT_TRUE(GetWindow(box, GW_OWNER) == dialog && !IsWindowEnabled(dialog));
+          editor_test::Click(box, IDOK);
+        });
+        EXPECT_EQ(caption + std::string(" | ") + text, "Tavrin object: help | " + std::string(help));
+        EXPECT_TRUE(IsWindowEnabled(dialog));
+      } else {
+        p.key ? editor_test::PressKey(dialog, static_cast<WPARAM>(p.code)) : editor_test::Click(dialog, p.code);
+      }
       if (i + 1 < presses.size()) {
         EXPECT_TRUE(IsWindowVisible(dialog)) << "press " << i;
       }
@@ -126,13 +142,15 @@ TEST(SetupDialog, ShowsTheSettingsAndKeepsThemWhateverEndsIt) {
   }
 }
 
+// A value of its own in every field, so that two controls swapped show.
 TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   EditorHost host = catalogue_test::HostWithVersion();
   EditData edit = FreshRecord();
   const auto typeAndOk = [](HWND dialog) {
     const std::pair<int, const char*> typed[] = {
-        {IDC_MASS, "123456789012"}, {IDC_START_ANGLE, "45"}, {IDC_ANCHOR_WIDTH, "abc"},
-        {IDC_PLATFORM_HEIGHT, ""},  {IDC_LINK_COUNT, "-5"}};
+        {IDC_MASS, "123456789012"}, {IDC_START_ANGLE, "45"}, {IDC_LINK_SPACING, "2.5"}, {IDC_GRAVITY, "9,81"},
+        {IDC_ANCHOR_WIDTH, "abc"},  {IDC_ANCHOR_HEIGHT, "41"}, {IDC_LINK_WIDTH, "7"},    {IDC_LINK_HEIGHT, "9"},
+        {IDC_PLATFORM_WIDTH, "80"}, {IDC_PLATFORM_HEIGHT, "12"}, {IDC_LINK_COUNT, "-5"}};
     for (const auto& [id, text] : typed) editor_test::Type(dialog, id, text);
     editor_test::Click(dialog, IDC_VIEW_TEMPLATE);
     editor_test::Click(dialog, IDOK);
@@ -144,9 +162,11 @@ TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   EditData expected = Defaults();
   SetText(expected.massText, "123456789");  // twelve digits cut to nine
   SetText(expected.startAngleText, "45");
-  expected.anchorWidth = 0;  // letters
-  expected.platformHeight = 0;  // empty
-  expected.linkCount = -5;
+  SetText(expected.linkSpacingText, "2.5");
+  SetText(expected.gravityText, "9,81");  // stored as typed; the run-time object reads 9
+  // Letters give 0.
+  std::tie(expected.anchorWidth, expected.anchorHeight, expected.linkWidth, expected.linkHeight, expected.platformWidth,
+           expected.platformHeight, expected.linkCount) = std::tuple{0, 41, 7, 9, 80, 12, -5};
   expected.viewTemplate = 1;
   EXPECT_TRUE(SameBytes(edit, expected));
 
@@ -157,8 +177,8 @@ TEST(SetupDialog, OkStoresWhatWasTypedAndReopeningShowsIt) {
   EXPECT_EQ(WithAuthor(ReadThenPress(shown, {kCancel}),
                        [&] { result = SelectPopup(&host, 2020, nullptr, nullptr, &edit, nullptr, nullptr); }),
             1);
-  EXPECT_EQ(shown, "1001=45 1002=123456789 1003=yyyyyyyyyy 1004=9.81 1005=64 1006=0 1007=32 1008=32 1009=0 "
-                   "1010=32 1011=-5 box=1");
+  EXPECT_EQ(shown, "1001=45 1002=123456789 1003=yyyyyyyyyy 1004=9,81 1005=80 1006=12 1007=7 1008=9 1009=0 "
+                   "1010=41 1011=-5 box=1");
   EXPECT_EQ(result, 0);
   EXPECT_TRUE(SameBytes(edit, before));
 }

@@ -1,13 +1,14 @@
 #!/usr/bin/env python3
 """Checks the resources of a built DLL: the setup dialog with its controls
-(ids and kinds, in order) and the two bitmaps of the object's picture.
+(ids and kinds, in order), the two bitmaps of the object's picture, and the
+version that Windows shows in the file's properties.
 
-usage: check_resources.py LIBRARY.dll
+usage: check_resources.py LIBRARY.dll VERSION
 """
 import struct
 import sys
 
-RT_BITMAP, RT_DIALOG = 2, 5
+RT_BITMAP, RT_DIALOG, RT_VERSION = 2, 5, 16
 SETUP_DIALOG = 20003
 NO_ID = 65535
 # The setup dialog's controls in template order: id and kind.
@@ -92,10 +93,49 @@ def dialog_controls(template):
     return controls
 
 
-def main(path):
+def version_blocks(data, at, end, path="", found=None):
+    """{"VS_VERSION_INFO/StringFileInfo/...": value bytes} of every block of a
+    version resource: each block is its length, its value's length and kind,
+    a key, then its value and its children, each 32-bit aligned."""
+    found = {} if found is None else found
+    while at + 6 <= end:
+        length, value_length, kind = struct.unpack_from("<3H", data, at)
+        if length == 0:
+            break
+        key_end = at + 6
+        while data[key_end:key_end + 2] not in (b"\0\0", b""):
+            key_end += 2
+        key = path + data[at + 6:key_end].decode("utf-16-le")
+        value_at = (key_end + 5) & ~3
+        value_end = value_at + value_length * (2 if kind == 1 else 1)
+        found[key] = data[value_at:value_end]
+        version_blocks(data, (value_end + 3) & ~3, at + length, key + "/", found)
+        at = (at + length + 3) & ~3
+    return found
+
+
+def version_info(resource):
+    """The fixed file version as "a.b.c.d", and the US English version strings by key."""
+    blocks = version_blocks(resource, 0, len(resource))
+    fixed = blocks.get("VS_VERSION_INFO", b"")
+    if len(fixed) < 16 or struct.unpack_from("<I", fixed)[0] != 0xFEEF04BD:
+        return None, {}
+    high, low = struct.unpack_from("<II", fixed, 8)
+    prefix = "VS_VERSION_INFO/StringFileInfo/040904B0/"
+    strings = {key[len(prefix):]: value.decode("utf-16-le").rstrip("\0")
+               for key, value in blocks.items() if key.startswith(prefix)}
+    return f"{high >> 16}.{high & 0xFFFF}.{low >> 16}.{low & 0xFFFF}", strings
+
+
+def main(path, version):
     with open(path, "rb") as f:
         found = resources(f.read())
     failures = []
+    parts = (version.split(".") + ["0"] * 4)[:4]
+    fixed, strings = version_info(found.get((RT_VERSION, 1), b""))
+    if fixed != ".".join(parts) or strings.get("FileVersion") != version or strings.get("ProductVersion") != version:
+        failures.append(f"version resource: {fixed}, file {strings.get('FileVersion')}, product "
+                        f"{strings.get('ProductVersion')}; expected {'.'.join(parts)} and {version}")
     dialog = found.get((RT_DIALOG, SETUP_DIALOG))
     if dialog is None:
         failures.append(f"no dialog {SETUP_DIALOG}")
@@ -112,8 +152,8 @@ def main(path):
                             f"expected {PICTURE_SIZE} bytes, 32 x 32 x 8")
     if failures:
         sys.exit(f"{path}:\n" + "\n".join(failures))
-    print(f"dialog {SETUP_DIALOG} with {len(CONTROLS)} controls and bitmaps {PICTURE_IDS} present")
+    print(f"dialog {SETUP_DIALOG} with {len(CONTROLS)} controls, bitmaps {PICTURE_IDS} and version {version} present")
 
 
 if __name__ == "__main__":
-    main(sys.argv[1])
+    main(sys.argv[1], sys.argv[2])

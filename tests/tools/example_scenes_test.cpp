@@ -1,9 +1,11 @@
 // The scenes that come with the player: the embedded demo, played to the end
-// into a GIF that decodes to the picture of its last frame, and the complete
-// example of docs/scene-format.md, which plays as the text says.
+// into a GIF that decodes to the picture of its last frame, the complete
+// example of docs/scene-format.md, which plays as the text says, and the
+// recipes of the author's guide, which play into the animations it shows.
 #include <gtest/gtest.h>
 
 #include <gif_lib.h>
+#include <filesystem>
 #include <memory>
 #include <nlohmann/json.hpp>
 #include <png.h>
@@ -70,7 +72,7 @@ TEST(DemoSceneTest, PlaysToTheEndIntoAGifOfEveryFrameEndingOnThePngFrame) {
 }
 
 TEST(DocumentedExampleTest, PlaysAndStopsWhenItsAnchorIsDestroyed) {
-  const std::string doc = ReadFile(SCENE_FORMAT_DOC);
+  const std::string doc = ReadFile(DOCS "/scene-format.md");
   const auto start = doc.find("```json\n", doc.find("## A complete example"));
   ASSERT_NE(start, std::string::npos);
   Folder folder;
@@ -87,6 +89,24 @@ TEST(DocumentedExampleTest, PlaysAndStopsWhenItsAnchorIsDestroyed) {
   EXPECT_TRUE(atDestruction["chains"].empty());
   EXPECT_EQ(atDestruction["objects"].size(), 5u);
   EXPECT_EQ(json::parse(lines[199])["objects"], atDestruction["objects"]);
+}
+
+// Each recipe's scene plays, without a warning, into the animation that the
+// guide shows, byte for byte; the animations stay small enough for a page.
+TEST(RecipeScenesTest, PlayIntoTheAnimationsTheGuideShows) {
+  const std::string guide = ReadFile(DOCS "/guide.md");
+  std::uintmax_t bytes = 0;
+  for (const auto& scene : std::filesystem::directory_iterator(DOCS "/recipes")) {
+    if (scene.path().extension() != ".json") continue;
+    const std::string gif = "recipes/" + scene.path().stem().string() + ".gif";
+    Folder folder;
+    const ToolRun run = RunPlayer({scene.path().string(), "--gif", "played.gif"}, folder);
+    EXPECT_TRUE(run.status == 0 && run.err.empty()) << gif << ": " << run.err;
+    EXPECT_TRUE(ReadFile(folder / "played.gif") == ReadFile(DOCS "/" + gif)) << gif << ": scripts/doc-pictures.sh";
+    EXPECT_NE(guide.find("](" + gif + ")"), std::string::npos) << gif;
+    bytes += std::filesystem::file_size(DOCS "/" + gif);
+  }
+  EXPECT_TRUE(bytes > 0 && bytes <= 300u * 1024) << bytes;
 }
 
 }  // namespace

@@ -2,11 +2,15 @@
 // The player keeps its own table of them, so that stored scenes keep their
 // meaning; this test holds that table to what the library's catalogue says
 // (menu texts, display strings, parameter counts, object parameters and
-// titles), so a changed text in the resources cannot pass unnoticed.
+// titles), so a changed text in the resources cannot pass unnoticed. The
+// author's guide is held to the catalogue too, so that no event an author
+// can pick goes undescribed.
 #include <gtest/gtest.h>
 #include <windows.h>
 
 #include <cstring>
+#include <fstream>
+#include <iterator>
 #include <map>
 #include <regex>
 #include <string>
@@ -43,13 +47,25 @@ uint16_t EntryWord(const void* entry, int index) {
 
 std::string Text(const char* text) { return text == nullptr ? "<none>" : text; }
 
-TEST(SceneNames, TablesMatchTheCatalogue) {
+// The author's guide describes each event an author can pick, under a
+// heading of its menu text, with its display text.
+void ExpectInGuide(const std::string& menu, const std::string& display) {
+  static const std::string guide = [] {
+    std::ifstream file(GUIDE_DOC);
+    return std::string{std::istreambuf_iterator<char>(file), {}};
+  }();
+  EXPECT_NE(guide.find("\n#### " + menu.substr(0, menu.find_last_not_of(' ') + 1) + "\n"), std::string::npos) << menu;
+  EXPECT_NE(guide.find("`" + display + "`"), std::string::npos) << display;
+}
+
+TEST(SceneNames, TablesAndGuideMatchTheCatalogue) {
   EditorHost host = catalogue_test::HostWithVersion();
   // "menu | display | parameter count" of an entry, as the catalogue and as the player's table say.
   const auto library = [&](std::map<int, std::string>& menus, int code, const void* entry,
                            void(TVCALL * display)(EditorHost*, int32_t, char*, int16_t)) {
     char text[256] = "";
     display(&host, code, text, sizeof text);
+    if (menus.count(code)) ExpectInGuide(menus[code], text);
     return Text(menus.count(code) ? menus[code].c_str() : nullptr) + " | " + text + " | " +
            std::to_string(EntryWord(entry, 2));
   };
@@ -71,6 +87,11 @@ TEST(SceneNames, TablesMatchTheCatalogue) {
       ours += std::string(" ") + (name.kinds[p] == ParamKind::Object ? "object " : "value ") + name.titles[p];
     }
     EXPECT_EQ(ours, theirs) << "action " << code;
+  }
+  for (const auto& [code, menu] : MenuTexts(&GetConditionMenu, &GetConditionCodeFromMenu)) {
+    char display[256] = "";
+    GetConditionString(&host, code, display, sizeof display);
+    ExpectInGuide(menu, display);
   }
   menus = MenuTexts(&GetExpressionMenu, &GetExpressionCodeFromMenu);
   for (int code = 0; code < scene_player::kExpressionNameCount; ++code) {

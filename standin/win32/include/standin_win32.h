@@ -55,5 +55,5 @@ std::size_t StandinLiveLocalBlockCount();
 // (initialised, focused and shown), to type and press through the Win32
 // calls as a person would. A dialog it leaves open would wait forever under
 // USER32; the stand-in reports it and stops the program. An empty function
-// removes the author.
-void StandinSetDialogAuthor(std::function<void(HWND dialog)> author);
+// removes the author. The author it replaces.
+std::function<void(HWND dialog)> StandinSetDialogAuthor(std::function<void(HWND dialog)> author);

@@ -145,6 +145,11 @@ static_assert(sizeof(MSG) == (sizeof(void*) == 8 ? 48 : 28));
 #define VK_RETURN 0x0D
 #define VK_ESCAPE 0x1B
 
+// Message boxes, and asking a window for its owner.
+#define MB_OK 0x0000
+#define MB_ICONINFORMATION 0x0040
+#define GW_OWNER 4
+
 // The dialog's user-data slot: after the message result and the dialog
 // procedure, each as wide as a pointer.
 #define DWLP_MSGRESULT 0
@@ -195,6 +200,10 @@ BOOL WINAPI IsDialogMessageA(HWND hDlg, MSG* lpMsg);
 HWND WINAPI GetFocus(void);
 BOOL WINAPI IsWindow(HWND hWnd);
 BOOL WINAPI IsWindowVisible(HWND hWnd);
+BOOL WINAPI IsWindowEnabled(HWND hWnd);
+HWND WINAPI GetWindow(HWND hWnd, UINT uCmd);
+int WINAPI GetWindowTextA(HWND hWnd, LPSTR lpString, int nMaxCount);
+int WINAPI MessageBoxA(HWND hWnd, LPCSTR lpText, LPCSTR lpCaption, UINT uType);
 #if UINTPTR_MAX == 0xFFFFFFFFu
 // With 32-bit pointers the pointer-sized calls and slot are the 32-bit ones,
 // exactly as in the Windows headers.
