@@ -3,8 +3,10 @@
 // Windows (or, for DRAVO2, the host) gives it, not what our own headers
 // say. Each row's function is checked at compile time to take exactly those
 // bytes in that convention, so a stand-in that disagrees with Windows does
-// not build. The image check reads these rows too and holds every call
-// site in the shipping DLL to them.
+// not build. The image check reads these rows too: they must be exactly the
+// shipping DLL's imports, so that each new import is a conscious change (a
+// row here, in the group of what needs it), and every call site in the DLL
+// is held to them.
 #pragma once
 
 #include <cstdint>

@@ -62,25 +62,31 @@ void Unlock(int) {}
 
 std::span<const ImportRow> MsvcrtImports() {
   static const ImportRow rows[] = {
-      Cdecl<4>("__setusermatherr", &SetUserMathErr),
-      Cdecl<4>("_amsg_exit", &AmsgExit),
-      Cdecl<0>("_errno", &__errno_location),
-      Cdecl<8>("_initterm", &Initterm),
-      Data("_iob", g_iob),
-      Cdecl<4>("_lock", &Lock),
-      Cdecl<4>("_unlock", &Unlock),
-      Cdecl<0>("abort", &abort),
-      Cdecl<8>("calloc", &calloc),
-      Cdecl<4>("free", &free),
-      Cdecl<16>("fwrite", &Fwrite),
+      // The library's own calls: the lists' storage and plain memory copies.
       Cdecl<4>("malloc", &malloc),
+      Cdecl<8>("realloc", &realloc),
+      Cdecl<4>("free", &free),
       Cdecl<12>("memcpy", &memcpy),
       Cdecl<12>("memmove", &memmove),
       Cdecl<12>("memset", &memset),
-      Cdecl<8>("realloc", &realloc),
+      // The C runtime's sine and cosine report domain errors through these.
+      Cdecl<0>("_errno", &__errno_location),
+      Cdecl<4>("__setusermatherr", &SetUserMathErr),
+      // Its DLL start-up: the start-up lock, initialisers and exit table.
+      Cdecl<4>("_amsg_exit", &AmsgExit),
+      Cdecl<8>("_initterm", &Initterm),
+      Cdecl<4>("_lock", &Lock),
+      Cdecl<4>("_unlock", &Unlock),
+      // Its thread-local storage callback.
+      Cdecl<8>("calloc", &calloc),
+      // Its relocation of imported data, and the message it writes when that
+      // fails.
+      Data("_iob", g_iob),
+      Cdecl<0>("abort", &abort),
+      Cdecl<16>("fwrite", &Fwrite),
+      Cdecl<12>("vfprintf", &Vfprintf),
       Cdecl<4>("strlen", &strlen),
       Cdecl<12>("strncmp", &strncmp),
-      Cdecl<12>("vfprintf", &Vfprintf),
   };
   return rows;
 }

@@ -1,63 +1,28 @@
 # Checks a built Windows DLL as it ships:
-# - it imports only from DLLs the host's system provides, or, given `imports`
-#   (a file of "DLL Function" or "DLL #ordinal" lines), exactly those;
+# - it imports only from DLLs the host's system provides (which functions,
+#   for the shipping DLL: check_call_sites.py);
 # - given `ceiling`, it is at most that many bytes;
 # - it holds no debug information but names the file beside it that does,
 #   through which an entry point's address reads as its source line.
 #   cmake -Dtool=<objdump> -Daddr2line=<addr2line> -Dlibrary=<dll>
-#         [-Dimports=<file>] [-Dceiling=<bytes>] -P check_dll.cmake
+#         [-Dceiling=<bytes>] -P check_dll.cmake
 execute_process(COMMAND ${tool} -p -h ${library} OUTPUT_VARIABLE dump RESULT_VARIABLE rc)
 if(NOT rc EQUAL 0)
   message(FATAL_ERROR "cannot read ${library}")
 endif()
 
-# The import tables: a "DLL Name: X" line, then a "vma hint name" row for each
-# function, where an import by ordinal shows its ordinal as the hint and
-# "<none>" as its name.
-string(FIND "${dump}" "The Import Tables" first)
-string(FIND "${dump}" "The Export Tables" last)
-if(first LESS 0 OR last LESS first)
-  message(FATAL_ERROR "${library} has no import tables followed by export tables")
+# The import tables: a "DLL Name: X" line for each DLL.
+string(REGEX MATCHALL "DLL Name: [^\n]+" dlls "${dump}")
+if(NOT dlls)
+  message(FATAL_ERROR "${library} has no import tables")
 endif()
-math(EXPR length "${last} - ${first}")
-string(SUBSTRING "${dump}" ${first} ${length} tables)
-string(REGEX MATCHALL "DLL Name: [^\n]+|\n\t[0-9a-f]+\t +[0-9]+ +[^\n]+" rows "${tables}")
-set(actual "")
-set(dlls "")
-foreach(row IN LISTS rows)
-  if(row MATCHES "DLL Name: ([^\n]+)")
-    set(dll ${CMAKE_MATCH_1})
-    list(APPEND dlls ${dll})
-  elseif(row MATCHES "\t +([0-9]+) +([^ ]+)$")
-    if(CMAKE_MATCH_2 STREQUAL "<none>")
-      list(APPEND actual "${dll} #${CMAKE_MATCH_1}")
-    else()
-      list(APPEND actual "${dll} ${CMAKE_MATCH_2}")
-    endif()
+foreach(row IN LISTS dlls)
+  string(REGEX REPLACE "DLL Name: " "" dll "${row}")
+  string(TOLOWER "${dll}" name)
+  if(NOT name MATCHES "^(kernel32|user32|msvcrt|dravo2)\\.dll$")
+    message(FATAL_ERROR "the DLL needs a DLL the host does not provide: ${dll}")
   endif()
 endforeach()
-if(imports)
-  file(STRINGS ${imports} expected REGEX "^[^#]")
-  set(missing ${expected})
-  list(REMOVE_ITEM missing ${actual})
-  set(extra ${actual})
-  list(REMOVE_ITEM extra ${expected})
-  if(missing OR extra)
-    list(JOIN extra "\n    " extra)
-    list(JOIN missing "\n    " missing)
-    message(FATAL_ERROR "the DLL's imports differ from ${imports}\n  imported, not listed:\n    ${extra}\n"
-                        "  listed, not imported:\n    ${missing}")
-  endif()
-  list(LENGTH actual count)
-  message(STATUS "${count} functions imported, exactly those listed")
-else()
-  foreach(dll IN LISTS dlls)
-    string(TOLOWER "${dll}" name)
-    if(NOT name MATCHES "^(kernel32|user32|msvcrt|dravo2)\\.dll$")
-      message(FATAL_ERROR "the DLL needs a DLL the host does not provide: ${dll}")
-    endif()
-  endforeach()
-endif()
 
 if(ceiling)
   file(SIZE ${library} size)
