@@ -14,6 +14,7 @@
 #include <new>
 #include <vector>
 
+#include "image_bytes.h"
 #include "import_tables.h"
 #include "loaded_images.h"
 #include "standin_win32.h"
@@ -66,24 +67,18 @@ void Unmap(LoadedImage* image) {
   delete image;
 }
 
-bool Fail(std::string& error, std::string message) {
-  error = std::move(message);
-  return false;
-}
-
 // Writes each import's address into its slot.
 bool ResolveImports(LoadedImage& image, std::string& error) {
   std::vector<ImportedDll> dlls;
   if (!ReadImports(Bytes(image), image.layout, dlls, error)) return false;
   for (const ImportedDll& dll : dlls) {
     const ImportTable* table = FindImportTable(dll.name);
-    if (table == nullptr) return Fail(error, "it imports from " + dll.name + ", which the loader does not provide");
+    if (table == nullptr) return Fail(error, "it imports from %s, which the loader does not provide", dll.name.c_str());
     for (const Import& import : dll.functions) {
       const ImportRow* row = FindImportRow(*table, import.name, import.ordinal);
       if (row == nullptr) {
-        return Fail(error, "it imports " + dll.name + (import.name.empty() ? " ordinal " + std::to_string(import.ordinal)
-                                                                             : "!" + import.name) +
-                               ", which the loader does not provide");
+        const std::string what = import.name.empty() ? " ordinal " + std::to_string(import.ordinal) : "!" + import.name;
+        return Fail(error, "it imports %s%s, which the loader does not provide", dll.name.c_str(), what.c_str());
       }
       const auto address = static_cast<uint32_t>(reinterpret_cast<uintptr_t>(row->address));
       std::memcpy(image.base + import.slotRva, &address, 4);
@@ -121,7 +116,7 @@ bool ProtectSections(LoadedImage& image, std::string& error) {
   image.pageProtections.assign(pages, 0);
   for (uint32_t page = 0; page < pages; ++page) {
     if (!ProtectPages(image, page, 1, SectionProtection(characteristics[page]))) {
-      return Fail(error, std::string("cannot protect its pages: ") + std::strerror(errno));
+      return Fail(error, "cannot protect its pages: %s", std::strerror(errno));
     }
   }
   return true;
@@ -150,14 +145,14 @@ bool SetUpThreadStorage(LoadedImage& image, std::string& error) {
 bool MapImage(const char* path, LoadedImage& image, std::string& error) {
   std::ifstream in(path, std::ios::binary);
   std::vector<uint8_t> file((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-  if (!in.good() && !in.eof()) return Fail(error, std::string("cannot read it: ") + std::strerror(errno));
+  if (!in.good() && !in.eof()) return Fail(error, "cannot read it: %s", std::strerror(errno));
   if (!ReadLayout(file, image.layout, error)) return false;
   const char* slash = std::strrchr(path, '/');
   image.name = slash == nullptr ? path : slash + 1;
   // Its preferred base if that is free; anywhere else means relocating.
   void* wanted = reinterpret_cast<void*>(uintptr_t{image.layout.imageBase});
   void* base = mmap(wanted, image.layout.sizeOfImage, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
-  if (base == MAP_FAILED) return Fail(error, std::string("no room for its image: ") + std::strerror(errno));
+  if (base == MAP_FAILED) return Fail(error, "no room for its image: %s", std::strerror(errno));
   image.base = static_cast<uint8_t*>(base);
   CopyImage(file, image.layout, Bytes(image));
   return Relocate(Bytes(image), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(base)), error) &&
