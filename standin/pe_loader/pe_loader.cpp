@@ -45,8 +45,6 @@ class WindowsFpuControl {
   uint16_t saved_ = 0;
 };
 
-std::span<uint8_t> Bytes(LoadedImage& image) { return {image.base, image.layout.sizeOfImage}; }
-
 // The TLS callbacks, then the entry point; the entry point's answer.
 int RunEntryPoints(LoadedImage& image, uint32_t reason) {
   const WindowsFpuControl windows;
@@ -70,7 +68,7 @@ void Unmap(LoadedImage* image) {
 // Writes each import's address into its slot.
 bool ResolveImports(LoadedImage& image, std::string& error) {
   std::vector<ImportedDll> dlls;
-  if (!ReadImports(Bytes(image), image.layout, dlls, error)) return false;
+  if (!ReadImports(image.bytes(), image.layout, dlls, error)) return false;
   for (const ImportedDll& dll : dlls) {
     const ImportTable* table = FindImportTable(dll.name);
     if (table == nullptr) return Fail(error, "it imports from %s, which the loader does not provide", dll.name.c_str());
@@ -90,7 +88,7 @@ bool ResolveImports(LoadedImage& image, std::string& error) {
 // Makes the image's resources what the resource calls find under its handle.
 bool AddResources(LoadedImage& image, std::string& error) {
   std::vector<Resource> resources;
-  if (!ReadResources(Bytes(image), image.layout, resources, error)) return false;
+  if (!ReadResources(image.bytes(), image.layout, resources, error)) return false;
   std::vector<standin::ResourceEntry> entries;
   for (const Resource& resource : resources) {
     entries.push_back({{resource.type.id, resource.type.text}, {resource.name.id, resource.name.text},
@@ -125,7 +123,7 @@ bool ProtectSections(LoadedImage& image, std::string& error) {
 // Gives the image its TLS index and this thread its copy of the image's TLS
 // data, as the Windows loader does for an image with a TLS directory.
 bool SetUpThreadStorage(LoadedImage& image, std::string& error) {
-  if (!ReadThreadStorage(Bytes(image), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(image.base)),
+  if (!ReadThreadStorage(image.bytes(), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(image.base)),
                          image.threadStorage, error)) {
     return error.empty();
   }
@@ -154,8 +152,8 @@ bool MapImage(const char* path, LoadedImage& image, std::string& error) {
   void* base = mmap(wanted, image.layout.sizeOfImage, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
   if (base == MAP_FAILED) return Fail(error, "no room for its image: %s", std::strerror(errno));
   image.base = static_cast<uint8_t*>(base);
-  CopyImage(file, image.layout, Bytes(image));
-  return Relocate(Bytes(image), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(base)), error) &&
+  CopyImage(file, image.layout, image.bytes());
+  return Relocate(image.bytes(), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(base)), error) &&
          ResolveImports(image, error) && AddResources(image, error) && EnsureThreadBlock(error) &&
          SetUpThreadStorage(image, error) && ProtectSections(image, error);
 }
@@ -201,9 +199,7 @@ void* PeLoadLibrary(const char* path, char* error, size_t error_size) {
 
 void* PeGetProcAddress(void* module, const char* name) {
   LoadedImage* image = pe::ImageOfHandle(module);
-  if (image == nullptr || name == nullptr) return nullptr;
-  const uint32_t rva = pe::FindExport(pe::Bytes(*image), image->layout, name);
-  return rva == 0 ? nullptr : image->base + rva;
+  return image == nullptr || name == nullptr ? nullptr : pe::ExportAddress(*image, name);
 }
 
 void PeFreeLibrary(void* module) {
