@@ -26,7 +26,7 @@ namespace {
 
 constexpr uint32_t kProcessDetach = 0;
 constexpr uint32_t kProcessAttach = 1;
-constexpr uint16_t kWindowsFpuControl = 0x027F;  // 53-bit precision, every exception masked
+constexpr uint16_t kWindowsFpuControl = PE_WINDOWS_FPU_CONTROL;
 
 using EntryPoint = int(__attribute__((stdcall)) *)(void* module, uint32_t reason, void* reserved);
 

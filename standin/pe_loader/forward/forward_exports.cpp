@@ -26,7 +26,7 @@ void* g_module = nullptr;
 // Windows starts the host's thread with 53-bit x87 precision, and every
 // call into the DLL (entry points, routine tables, dialog procedures) runs
 // under it there; so it does here from the start.
-constexpr uint16_t kWindowsFpuControl = 0x027F;
+constexpr uint16_t kWindowsFpuControl = PE_WINDOWS_FPU_CONTROL;
 
 }  // namespace
 
