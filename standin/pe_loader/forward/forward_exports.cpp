@@ -16,9 +16,9 @@
 namespace {
 
 const char* const kNames[] = {
-#define TAVRIN_FORWARD(index, name) #name,
-#include "forwarded_exports.inc"
-#undef TAVRIN_FORWARD
+#define TAVRIN_ENTRY_POINT(index, name, words) #name,
+#include "entry_points.inc"
+#undef TAVRIN_ENTRY_POINT
 };
 
 void* g_module = nullptr;
@@ -71,7 +71,7 @@ asm(R"(
     .size \name, .-\name
     .endm
 )"
-#define TAVRIN_FORWARD(index, name) "TAVRIN_FORWARD " #index ", " #name "\n"
-#include "forwarded_exports.inc"
-#undef TAVRIN_FORWARD
+#define TAVRIN_ENTRY_POINT(index, name, words) "TAVRIN_FORWARD " #index ", " #name "\n"
+#include "entry_points.inc"
+#undef TAVRIN_ENTRY_POINT
 );
