@@ -13,8 +13,6 @@
 #include <span>
 #include <string_view>
 
-#include "pe_image.h"
-
 namespace pe {
 
 enum class Convention { Stdcall, Thiscall, Cdecl, Data };
