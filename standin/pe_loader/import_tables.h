@@ -13,8 +13,6 @@
 #include <span>
 #include <string_view>
 
-#include "pe_image.h"
-
 namespace pe {
 
 enum class Convention { Stdcall, Thiscall, Cdecl, Data };
@@ -34,22 +32,24 @@ struct ImportTable {
 
 // Argument bytes of a function type: each argument takes its size rounded up
 // to 4 bytes; __thiscall's object travels in ECX, not on the stack.
+template <class... A>
+constexpr uint32_t kStackBytes = (0 + ... + ((sizeof(A) + 3) & ~3u));
 template <class F>
 struct Signature;
 template <class R, bool N, class... A>
 struct Signature<R(__attribute__((stdcall)) *)(A...) noexcept(N)> {
   static constexpr Convention convention = Convention::Stdcall;
-  static constexpr uint32_t bytes = (0 + ... + ((sizeof(A) + 3) & ~3u));
+  static constexpr uint32_t bytes = kStackBytes<A...>;
 };
 template <class R, bool N, class S, class... A>
 struct Signature<R(__attribute__((thiscall)) *)(S*, A...) noexcept(N)> {
   static constexpr Convention convention = Convention::Thiscall;
-  static constexpr uint32_t bytes = (0 + ... + ((sizeof(A) + 3) & ~3u));
+  static constexpr uint32_t bytes = kStackBytes<A...>;
 };
 template <class R, bool N, class... A>
 struct Signature<R (*)(A...) noexcept(N)> {
   static constexpr Convention convention = Convention::Cdecl;
-  static constexpr uint32_t bytes = (0 + ... + ((sizeof(A) + 3) & ~3u));
+  static constexpr uint32_t bytes = kStackBytes<A...>;
 };
 
 template <Convention C, uint32_t Bytes, class F>

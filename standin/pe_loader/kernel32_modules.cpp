@@ -46,9 +46,9 @@ FARPROC WINAPI GetProcAddress(HMODULE module, LPCSTR name) {
     SetLastError(kErrorModNotFound);
     return nullptr;
   }
-  const uint32_t rva = IS_INTRESOURCE(name) ? 0 : FindExport({image->base, image->layout.sizeOfImage}, image->layout, name);
-  if (rva == 0) SetLastError(kErrorProcNotFound);
-  return rva == 0 ? nullptr : image->base + rva;
+  void* address = IS_INTRESOURCE(name) ? nullptr : ExportAddress(*image, name);
+  if (address == nullptr) SetLastError(kErrorProcNotFound);
+  return address;
 }
 
 // Pages of a loaded image only; any other address fails.

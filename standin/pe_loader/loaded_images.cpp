@@ -47,6 +47,11 @@ LoadedImage* ImageOfHandle(const void* handle) {
   return nullptr;
 }
 
+void* ExportAddress(const LoadedImage& image, std::string_view name) {
+  const uint32_t rva = FindExport(image.bytes(), image.layout, name);
+  return rva == 0 ? nullptr : image.base + rva;
+}
+
 LoadedImage* ImageContaining(const void* address) {
   const auto at = reinterpret_cast<uintptr_t>(address);
   for (LoadedImage* image : LoadedImages()) {

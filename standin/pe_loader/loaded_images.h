@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -20,12 +21,16 @@ struct LoadedImage {
   std::vector<uint32_t> pageProtections;  // each page's PAGE_* value
   ThreadStorage threadStorage;
   void* threadData = nullptr;  // this thread's copy of the TLS template
+
+  std::span<uint8_t> bytes() const { return {base, layout.sizeOfImage}; }
 };
 
 std::vector<LoadedImage*>& LoadedImages();
 
 // The image whose handle (its base) is `handle`, or null.
 LoadedImage* ImageOfHandle(const void* handle);
+// The address of the function `image` exports as `name`, or null.
+void* ExportAddress(const LoadedImage& image, std::string_view name);
 // The image whose pages hold `address`, or null.
 LoadedImage* ImageContaining(const void* address);
 // True when `name` names the file `file` as Windows finds modules: without

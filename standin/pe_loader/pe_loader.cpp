@@ -14,6 +14,7 @@
 #include <new>
 #include <vector>
 
+#include "image_bytes.h"
 #include "import_tables.h"
 #include "loaded_images.h"
 #include "standin_win32.h"
@@ -25,7 +26,7 @@ namespace {
 
 constexpr uint32_t kProcessDetach = 0;
 constexpr uint32_t kProcessAttach = 1;
-constexpr uint16_t kWindowsFpuControl = 0x027F;  // 53-bit precision, every exception masked
+constexpr uint16_t kWindowsFpuControl = PE_WINDOWS_FPU_CONTROL;
 
 using EntryPoint = int(__attribute__((stdcall)) *)(void* module, uint32_t reason, void* reserved);
 
@@ -43,8 +44,6 @@ class WindowsFpuControl {
  private:
   uint16_t saved_ = 0;
 };
-
-std::span<uint8_t> Bytes(LoadedImage& image) { return {image.base, image.layout.sizeOfImage}; }
 
 // The TLS callbacks, then the entry point; the entry point's answer.
 int RunEntryPoints(LoadedImage& image, uint32_t reason) {
@@ -66,24 +65,18 @@ void Unmap(LoadedImage* image) {
   delete image;
 }
 
-bool Fail(std::string& error, std::string message) {
-  error = std::move(message);
-  return false;
-}
-
 // Writes each import's address into its slot.
 bool ResolveImports(LoadedImage& image, std::string& error) {
   std::vector<ImportedDll> dlls;
-  if (!ReadImports(Bytes(image), image.layout, dlls, error)) return false;
+  if (!ReadImports(image.bytes(), image.layout, dlls, error)) return false;
   for (const ImportedDll& dll : dlls) {
     const ImportTable* table = FindImportTable(dll.name);
-    if (table == nullptr) return Fail(error, "it imports from " + dll.name + ", which the loader does not provide");
+    if (table == nullptr) return Fail(error, "it imports from %s, which the loader does not provide", dll.name.c_str());
     for (const Import& import : dll.functions) {
       const ImportRow* row = FindImportRow(*table, import.name, import.ordinal);
       if (row == nullptr) {
-        return Fail(error, "it imports " + dll.name + (import.name.empty() ? " ordinal " + std::to_string(import.ordinal)
-                                                                             : "!" + import.name) +
-                               ", which the loader does not provide");
+        const std::string what = import.name.empty() ? " ordinal " + std::to_string(import.ordinal) : "!" + import.name;
+        return Fail(error, "it imports %s%s, which the loader does not provide", dll.name.c_str(), what.c_str());
       }
       const auto address = static_cast<uint32_t>(reinterpret_cast<uintptr_t>(row->address));
       std::memcpy(image.base + import.slotRva, &address, 4);
@@ -95,7 +88,7 @@ bool ResolveImports(LoadedImage& image, std::string& error) {
 // Makes the image's resources what the resource calls find under its handle.
 bool AddResources(LoadedImage& image, std::string& error) {
   std::vector<Resource> resources;
-  if (!ReadResources(Bytes(image), image.layout, resources, error)) return false;
+  if (!ReadResources(image.bytes(), image.layout, resources, error)) return false;
   std::vector<standin::ResourceEntry> entries;
   for (const Resource& resource : resources) {
     entries.push_back({{resource.type.id, resource.type.text}, {resource.name.id, resource.name.text},
@@ -121,7 +114,7 @@ bool ProtectSections(LoadedImage& image, std::string& error) {
   image.pageProtections.assign(pages, 0);
   for (uint32_t page = 0; page < pages; ++page) {
     if (!ProtectPages(image, page, 1, SectionProtection(characteristics[page]))) {
-      return Fail(error, std::string("cannot protect its pages: ") + std::strerror(errno));
+      return Fail(error, "cannot protect its pages: %s", std::strerror(errno));
     }
   }
   return true;
@@ -130,7 +123,7 @@ bool ProtectSections(LoadedImage& image, std::string& error) {
 // Gives the image its TLS index and this thread its copy of the image's TLS
 // data, as the Windows loader does for an image with a TLS directory.
 bool SetUpThreadStorage(LoadedImage& image, std::string& error) {
-  if (!ReadThreadStorage(Bytes(image), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(image.base)),
+  if (!ReadThreadStorage(image.bytes(), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(image.base)),
                          image.threadStorage, error)) {
     return error.empty();
   }
@@ -150,17 +143,17 @@ bool SetUpThreadStorage(LoadedImage& image, std::string& error) {
 bool MapImage(const char* path, LoadedImage& image, std::string& error) {
   std::ifstream in(path, std::ios::binary);
   std::vector<uint8_t> file((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-  if (!in.good() && !in.eof()) return Fail(error, std::string("cannot read it: ") + std::strerror(errno));
+  if (!in.good() && !in.eof()) return Fail(error, "cannot read it: %s", std::strerror(errno));
   if (!ReadLayout(file, image.layout, error)) return false;
   const char* slash = std::strrchr(path, '/');
   image.name = slash == nullptr ? path : slash + 1;
   // Its preferred base if that is free; anywhere else means relocating.
   void* wanted = reinterpret_cast<void*>(uintptr_t{image.layout.imageBase});
   void* base = mmap(wanted, image.layout.sizeOfImage, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
-  if (base == MAP_FAILED) return Fail(error, std::string("no room for its image: ") + std::strerror(errno));
+  if (base == MAP_FAILED) return Fail(error, "no room for its image: %s", std::strerror(errno));
   image.base = static_cast<uint8_t*>(base);
-  CopyImage(file, image.layout, Bytes(image));
-  return Relocate(Bytes(image), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(base)), error) &&
+  CopyImage(file, image.layout, image.bytes());
+  return Relocate(image.bytes(), image.layout, static_cast<uint32_t>(reinterpret_cast<uintptr_t>(base)), error) &&
          ResolveImports(image, error) && AddResources(image, error) && EnsureThreadBlock(error) &&
          SetUpThreadStorage(image, error) && ProtectSections(image, error);
 }
@@ -206,9 +199,7 @@ void* PeLoadLibrary(const char* path, char* error, size_t error_size) {
 
 void* PeGetProcAddress(void* module, const char* name) {
   LoadedImage* image = pe::ImageOfHandle(module);
-  if (image == nullptr || name == nullptr) return nullptr;
-  const uint32_t rva = pe::FindExport(pe::Bytes(*image), image->layout, name);
-  return rva == 0 ? nullptr : image->base + rva;
+  return image == nullptr || name == nullptr ? nullptr : pe::ExportAddress(*image, name);
 }
 
 void PeFreeLibrary(void* module) {

@@ -6,9 +6,10 @@
  *
  * One thread's loader: load, call and free on the thread that loaded the
  * first image. That thread gets a Windows thread block through %fs. Windows
- * runs threads with the x87 control word 0x027F (53-bit precision), Linux
- * with 0x037F: the loader runs the image's start-up and shut-down under
- * Windows' word, and a driver that calls into the image sets it too. */
+ * runs threads with the x87 control word PE_WINDOWS_FPU_CONTROL, Linux with
+ * 0x037F (64-bit precision): the loader runs the image's start-up and
+ * shut-down under Windows' word, and a driver that calls into the image sets
+ * it too. */
 #ifndef PE_LOADER_H
 #define PE_LOADER_H
 
@@ -19,6 +20,9 @@ extern "C" {
 #endif
 
 #define PE_LOADER_API __attribute__((visibility("default")))
+
+/* 53-bit precision, every exception masked. */
+#define PE_WINDOWS_FPU_CONTROL 0x027F
 
 /* Maps the DLL at `path`, applies its relocations when its preferred base is
  * taken, resolves its imports, runs its TLS callbacks and its entry point

@@ -11,8 +11,7 @@ extern const std::size_t kLibraryResourcesSize;
 
 namespace {
 
-// The one module this stand-in knows. Its address is the handle, so a handle
-// that is not this one can be recognised as foreign.
+// The library's module: its address is the handle, unlike any other.
 char g_moduleTag;
 
 struct LoadLibrary {
@@ -24,5 +23,3 @@ struct LoadLibrary {
 } g_load;
 
 }  // namespace
-
-HINSTANCE StandinLibraryModule() { return reinterpret_cast<HINSTANCE>(&g_moduleTag); }

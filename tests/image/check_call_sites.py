@@ -56,7 +56,7 @@ def import_slots(image):
     for descriptor in range(directory, 1 << 32, 20):
         lookup, _, _, name, first = struct.unpack_from("<5I", image, at(descriptor))
         if name == 0 and first == 0:
-            return slots, base
+            return slots
         dll = text(name).lower()
         for i in range(1 << 20):
             (entry,) = struct.unpack_from("<I", image, at((lookup or first) + 4 * i))
@@ -153,7 +153,7 @@ def register_calls(instructions, slots):
 
 def main(tool, library, tables_directory):
     tables = import_tables(tables_directory)
-    slots, _ = import_slots(pathlib.Path(library).read_bytes())
+    slots = import_slots(pathlib.Path(library).read_bytes())
     imported = set(slots.values())
     tabled = {(dll, function) for dll, rows in tables.items() for function in rows}
     failures = [f"the tables have a row for {dll} {function}, which the DLL does not import"

@@ -91,9 +91,9 @@ TEST(Forwarding, EveryEntryPointReachesTheDllsExportOfItsName) {
     const char* name;
     uint32_t words;
   } exports[] = {
-#define TAVRIN_PROBE(index, name, words) {#name, words},
-#include "probe_exports.inc"
-#undef TAVRIN_PROBE
+#define TAVRIN_ENTRY_POINT(index, name, words) {#name, words},
+#include "entry_points.inc"
+#undef TAVRIN_ENTRY_POINT
   };
   ASSERT_EQ(std::size(exports), 48u);
   for (uint32_t index = 0; index < std::size(exports); ++index) {

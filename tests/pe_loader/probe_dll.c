@@ -39,9 +39,9 @@ static unsigned Answer(unsigned index, unsigned count, const unsigned* words) {
 #define VALUES_5 VALUES_4, e
 #define VALUES_6 VALUES_5, f
 #define VALUES_7 VALUES_6, g
-#define TAVRIN_PROBE(index, name, words)                  \
+#define TAVRIN_ENTRY_POINT(index, name, words)            \
   PROBE_API unsigned __stdcall name(WORDS_##words) {      \
     const unsigned given[] = {VALUES_##words};            \
     return Answer(index, words, given);                   \
   }
-#include "probe_exports.inc"
+#include "entry_points.inc"

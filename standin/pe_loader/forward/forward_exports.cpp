@@ -16,9 +16,9 @@
 namespace {
 
 const char* const kNames[] = {
-#define TAVRIN_FORWARD(index, name) #name,
-#include "forwarded_exports.inc"
-#undef TAVRIN_FORWARD
+#define TAVRIN_ENTRY_POINT(index, name, words) #name,
+#include "entry_points.inc"
+#undef TAVRIN_ENTRY_POINT
 };
 
 void* g_module = nullptr;
@@ -26,7 +26,7 @@ void* g_module = nullptr;
 // Windows starts the host's thread with 53-bit x87 precision, and every
 // call into the DLL (entry points, routine tables, dialog procedures) runs
 // under it there; so it does here from the start.
-constexpr uint16_t kWindowsFpuControl = 0x027F;
+constexpr uint16_t kWindowsFpuControl = PE_WINDOWS_FPU_CONTROL;
 
 }  // namespace
 
@@ -71,7 +71,7 @@ asm(R"(
     .size \name, .-\name
     .endm
 )"
-#define TAVRIN_FORWARD(index, name) "TAVRIN_FORWARD " #index ", " #name "\n"
-#include "forwarded_exports.inc"
-#undef TAVRIN_FORWARD
+#define TAVRIN_ENTRY_POINT(index, name, words) "TAVRIN_FORWARD " #index ", " #name "\n"
+#include "entry_points.inc"
+#undef TAVRIN_ENTRY_POINT
 );

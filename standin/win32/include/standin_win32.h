@@ -38,10 +38,6 @@ bool StandinAddModule(HMODULE module, std::vector<standin::ResourceEntry> resour
 // The module's resources are gone, and so are its HRSRC handles.
 void StandinRemoveModule(HMODULE module);
 
-// The library's module instance handle (the one DllMain received) when the
-// library and this stand-in are built into one program.
-HINSTANCE StandinLibraryModule();
-
 // After `successes` more calls succeed, the next `failures` calls of
 // LocalAlloc (or CreatePopupMenu) fail as they do when memory runs out.
 void StandinFailLocalAlloc(int successes, int failures = 1);
