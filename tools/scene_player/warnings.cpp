@@ -5,6 +5,7 @@
 #include <cmath>
 #include <cstdio>
 #include <optional>
+#include <tuple>
 #include <utility>
 
 #include "shown_text.h"
@@ -118,7 +119,7 @@ std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& 
                        " degrees in one frame, more than a full turn: its gravity x mass is far too large for its "
                        "length, or its speed was set so");
   }
-  for (std::string& warning : RegroupedLinks(scene, player, at)) warnings.push_back(std::move(warning));
+  for (std::string& warning : RegroupedLinks(scene, player, frame, at)) warnings.push_back(std::move(warning));
 
   std::optional<std::pair<uint32_t, float>> notFinite;  // the first chain and its value
   for (uint32_t i = 0; i < chains && !notFinite; ++i) {
@@ -138,38 +139,33 @@ std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& 
   return warnings;
 }
 
-std::vector<std::string> FrameWarnings::RegroupedLinks(const Scene& scene, const Player& player, const std::string& at) {
+std::vector<std::string> FrameWarnings::RegroupedLinks(const Scene& scene, const Player& player, int frame,
+                                                       const std::string& at) {
   const RunData& rd = player.extension();
-  std::vector<std::pair<int, int>> owned;  // (link, its chain's anchor), as scene objects
+  owners_.resize(scene.objects.size());
+  int moved = -1, from = -1, to = -1, count = 0;
   const uint32_t perChain = LinksPerChain(rd);
   for (uint32_t i = 0; i < ChainCount(rd); ++i) {
     const int anchor = player.IndexOf(rd.chains->At(i).anchor);
     for (uint32_t k = 0; k < perChain; ++k) {
       const int link = player.IndexOf(rd.links->At(perChain * i + k));
-      if (link >= 0 && anchor >= 0) owned.emplace_back(link, anchor);
+      if (link < 0 || anchor < 0) continue;
+      // A link added twice is in two places: the first is its chain.
+      Owner& owner = owners_[static_cast<std::size_t>(link)];
+      if (owner.frame == frame) continue;
+      if (owner.anchor >= 0 && owner.anchor != anchor) {
+        if (count++ == 0) std::tie(moved, from, to) = std::tuple(link, owner.anchor, anchor);
+      }
+      // A link keeps the chain it last belonged to while it belongs to none.
+      owner = {anchor, frame};
     }
   }
-  owners_.resize(scene.objects.size(), -1);
-  int moved = -1, count = 0;
-  for (const auto& [link, anchor] : owned) {
-    const int before = owners_[static_cast<std::size_t>(link)];
-    if (before < 0 || before == anchor) continue;
-    if (moved < 0) moved = link;
-    ++count;
-  }
-  std::vector<std::string> warnings;
-  if (moved >= 0) {
-    const int before = owners_[static_cast<std::size_t>(moved)];
-    const int after = std::find_if(owned.begin(), owned.end(), [&](const auto& o) { return o.first == moved; })->second;
-    warnings.push_back(at + "link " + Quoted(scene, moved) + " went from the chain of anchor " + Quoted(scene, before) +
-                       " to the chain of anchor " + Quoted(scene, after) +
-                       (count > 1 ? " (" + std::to_string(count) + " links changed chains)" : "") +
-                       ": the library shares the links out among the chains in the order they were added, so adding "
-                       "or removing a chain or a link regroups them");
-  }
-  // A link keeps the chain it last belonged to while it belongs to none.
-  for (const auto& [link, anchor] : owned) owners_[static_cast<std::size_t>(link)] = anchor;
-  return warnings;
+  if (count == 0) return {};
+  return {at + "link " + Quoted(scene, moved) + " went from the chain of anchor " + Quoted(scene, from) +
+          " to the chain of anchor " + Quoted(scene, to) +
+          (count > 1 ? " (" + std::to_string(count) + " links changed chains)" : "") +
+          ": the library shares the links out among the chains in the order they were added, so adding or removing "
+          "a chain or a link regroups them"};
 }
 
 std::vector<std::string> FrameWarnings::Finish(const Scene& scene) const {

@@ -28,7 +28,7 @@ class FrameWarnings {
   std::vector<std::string> Finish(const Scene& scene) const;
 
  private:
-  std::vector<std::string> RegroupedLinks(const Scene& scene, const Player& player, const std::string& at);
+  std::vector<std::string> RegroupedLinks(const Scene& scene, const Player& player, int frame, const std::string& at);
 
   bool uneven_ = false;
   bool heights_ = false;
@@ -38,8 +38,12 @@ class FrameWarnings {
   uint32_t mostChains_ = 0;
   // For each scene object that has been a link of a chain, the scene object
   // of that chain's anchor at the end of the last frame it belonged to one
-  // (-1: never).
-  std::vector<int> owners_;
+  // (-1: never), and that frame.
+  struct Owner {
+    int anchor = -1;
+    int frame = -1;
+  };
+  std::vector<Owner> owners_;
 };
 
 }  // namespace scene_player
