@@ -83,7 +83,7 @@ void Play(const Run& run) {
     if (traceFile) WriteTraceLine(traceFile->stream(), frame, scene, player);
     messages.Progress(frame, run.frames);
   }
-  messages.Warn(frameWarnings.Finish(scene));
+  messages.Warn(RuleWarnings(scene, player));
   messages.EndProgressLine();
   gif.Finish();
   gifFile.Close();

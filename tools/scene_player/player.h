@@ -40,6 +40,10 @@ class Player {
   // this frame, which stay readable until its handle call has run.
   int IndexOf(const HostObject* object) const;
 
+  // The most chains the library has held at any moment of the run: a chain
+  // may come and go within one frame (a rule destroys its anchor).
+  uint32_t mostChains() const { return mostChains_; }
+
   // What the steps run since the last call addressed that did not exist
   // ("PLACE: message"), each step and routine said once in the run.
   std::vector<std::string> TakeWarnings() { return std::exchange(warnings_, {}); }
@@ -82,6 +86,7 @@ class Player {
   int frame_ = 0;       // the frame being played, for {"count": "frame"}
   int repetition_ = 0;  // of the repeating entry being run, for {"count": "repetition"}
   const Step* running_ = nullptr;  // the step being run, for its warnings
+  uint32_t mostChains_ = 0;
   std::vector<std::string> warnings_;
   std::set<std::string> warned_;
   // An exception must not cross the library's swing step: one thrown while

@@ -102,7 +102,6 @@ std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& 
                        "first link added; each link is placed by its own height");
   }
 
-  mostChains_ = std::max(mostChains_, chains);
   bool swings = false;
   std::optional<std::pair<uint32_t, float>> spinning;  // the first chain and its speed
   for (uint32_t i = 0; i < chains; ++i) {
@@ -168,15 +167,16 @@ std::vector<std::string> FrameWarnings::RegroupedLinks(const Scene& scene, const
           "a chain or a link regroups them"};
 }
 
-std::vector<std::string> FrameWarnings::Finish(const Scene& scene) const {
+std::vector<std::string> RuleWarnings(const Scene& scene, const Player& player) {
+  const uint32_t mostChains = player.mostChains();
   std::vector<std::string> warnings;
   for (std::size_t i = 0; i < scene.rules.size(); ++i) {
     const int32_t chain = scene.rules[i].chain;
-    if (chain >= 0 && static_cast<uint32_t>(chain) < mostChains_) continue;
+    if (chain >= 0 && static_cast<uint32_t>(chain) < mostChains) continue;
     warnings.push_back("onSwing[" + std::to_string(i) + "].chain: the rule is for chain " + std::to_string(chain) +
                        (chain < 0 ? ", but chain numbers count from 0"
-                                  : ", but the scene never had more than " + std::to_string(mostChains_) +
-                                        (mostChains_ == 1 ? " chain" : " chains")) +
+                                  : ", but the scene never had more than " + std::to_string(mostChains) +
+                                        (mostChains == 1 ? " chain" : " chains")) +
                        ": it never ran");
   }
   return warnings;
