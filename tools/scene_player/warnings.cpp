@@ -39,6 +39,8 @@ bool IsNumber(const std::string& text) {
          !std::isnan(value) && !std::isinf(value);
 }
 
+std::string At(int frame) { return "frame " + std::to_string(frame) + ": "; }
+
 // Whether a condition holds now but did not at the last check; remembers it.
 bool Appears(bool now, bool& before) {
   const bool appeared = now && !before;
@@ -77,69 +79,58 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& rd) 
 
 std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& player, int frame) {
   const RunData& rd = player.extension();
-  const std::string at = "frame " + std::to_string(frame) + ": ";
   std::vector<std::string> warnings;
 
   const uint32_t links = LinkCount(rd), chains = ChainCount(rd);
   if (Appears(chains > 0 && links % chains != 0, uneven_)) {
-    warnings.push_back(at + std::to_string(links) + (links == 1 ? " link does" : " links do") +
-                       " not divide evenly among " + std::to_string(chains) + " chains: each chain takes " + std::to_string(links / chains) +
-                       " in the order they were added, and the last " + std::to_string(links % chains) +
-                       " belong to no chain");
+    warnings.push_back(At(frame) + std::to_string(links) + (links == 1 ? " link does" : " links do") +
+                       " not divide evenly among " + std::to_string(chains) + " chains: each chain takes " +
+                       std::to_string(links / chains) + " in the order they were added, and the last " +
+                       std::to_string(links % chains) + " belong to no chain");
   }
 
-  // Heights from the scene: the objects in the list are those of the scene,
-  // and what the library knows of them never changes.
-  auto heightOf = [&](uint32_t j) {
-    const int index = player.IndexOf(rd.links->At(j));
-    return index < 0 ? -1 : scene.objects[static_cast<std::size_t>(index)].height;
-  };
+  // Every object in the lists is on the frame: the library dropped the
+  // destroyed ones before the host freed them.
+  const auto heightOf = [&](uint32_t j) { return rd.links->At(j)->head.height; };
   uint32_t other = 1;  // the first link whose height differs from the first's
   while (other < links && heightOf(other) == heightOf(0)) ++other;
   if (Appears(other < links, heights_)) {
-    warnings.push_back(at + "links of differing heights (" + std::to_string(heightOf(0)) + " and " +
+    warnings.push_back(At(frame) + "links of differing heights (" + std::to_string(heightOf(0)) + " and " +
                        std::to_string(heightOf(other)) + "): every chain's length comes from the height of the "
                        "first link added; each link is placed by its own height");
   }
 
   bool swings = false;
-  std::optional<std::pair<uint32_t, float>> spinning;  // the first chain and its speed
+  std::optional<std::pair<uint32_t, float>> spinning, notFinite;  // the first chain and its value
   for (uint32_t i = 0; i < chains; ++i) {
     const ChainRecord& r = rd.chains->At(i);
     swings = swings || r.swinging == 1;
     if (!spinning && std::isfinite(r.speed) && std::fabs(r.speed) > kFullTurn) spinning = {i, r.speed};
-  }
-  if (Appears(swings && links == 0, noLinks_)) {
-    warnings.push_back(at + "a chain swings with no links at all (none were added, or all were destroyed): its "
-                            "length is then only its link spacing, and its platform hangs that close to its anchor");
-  }
-  if (Appears(spinning.has_value(), spinning_)) {
-    warnings.push_back(at + "chain " + std::to_string(spinning->first) + " turns " + Number(spinning->second) +
-                       " degrees in one frame, more than a full turn: its gravity x mass is far too large for its "
-                       "length, or its speed was set so");
-  }
-  for (std::string& warning : RegroupedLinks(scene, player, frame, at)) warnings.push_back(std::move(warning));
-
-  std::optional<std::pair<uint32_t, float>> notFinite;  // the first chain and its value
-  for (uint32_t i = 0; i < chains && !notFinite; ++i) {
-    const ChainRecord& r = rd.chains->At(i);
     for (float value : {r.mass, r.angle, r.speed, r.linkSpacing, r.acceleration, r.platformX, r.platformY}) {
-      if (!std::isfinite(value)) {
-        notFinite = {i, value};
-        break;
-      }
+      if (!notFinite && !std::isfinite(value)) notFinite = {i, value};
     }
   }
+  if (Appears(swings && links == 0, noLinks_)) {
+    warnings.push_back(At(frame) + "a chain swings with no links at all (none were added, or all were destroyed): "
+                       "its length is then only its link spacing, and its platform hangs that close to its anchor");
+  }
+  if (Appears(spinning.has_value(), spinning_)) {
+    warnings.push_back(At(frame) + "chain " + std::to_string(spinning->first) + " turns " +
+                       Number(spinning->second) + " degrees in one frame, more than a full turn: its gravity x mass "
+                       "is far too large for its length, or its speed was set so");
+  }
+  if (std::string regrouped = RegroupedLinks(scene, player, frame); !regrouped.empty()) {
+    warnings.push_back(std::move(regrouped));
+  }
   if (Appears(notFinite.has_value(), notFinite_)) {
-    warnings.push_back(at + "chain " + std::to_string(notFinite->first) +
+    warnings.push_back(At(frame) + "chain " + std::to_string(notFinite->first) +
                        " holds a value that is no longer finite (" + Number(notFinite->second) +
                        "): what follows from it is not finite either");
   }
   return warnings;
 }
 
-std::vector<std::string> FrameWarnings::RegroupedLinks(const Scene& scene, const Player& player, int frame,
-                                                       const std::string& at) {
+std::string FrameWarnings::RegroupedLinks(const Scene& scene, const Player& player, int frame) {
   const RunData& rd = player.extension();
   owners_.resize(scene.objects.size());
   int moved = -1, from = -1, to = -1, count = 0;
@@ -160,11 +151,11 @@ std::vector<std::string> FrameWarnings::RegroupedLinks(const Scene& scene, const
     }
   }
   if (count == 0) return {};
-  return {at + "link " + Quoted(scene, moved) + " went from the chain of anchor " + Quoted(scene, from) +
-          " to the chain of anchor " + Quoted(scene, to) +
-          (count > 1 ? " (" + std::to_string(count) + " links changed chains)" : "") +
-          ": the library shares the links out among the chains in the order they were added, so adding or removing "
-          "a chain or a link regroups them"};
+  return At(frame) + "link " + Quoted(scene, moved) + " went from the chain of anchor " + Quoted(scene, from) +
+         " to the chain of anchor " + Quoted(scene, to) +
+         (count > 1 ? " (" + std::to_string(count) + " links changed chains)" : "") +
+         ": the library shares the links out among the chains in the order they were added, so adding or removing a "
+         "chain or a link regroups them";
 }
 
 std::vector<std::string> RuleWarnings(const Scene& scene, const Player& player) {

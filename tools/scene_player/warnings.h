@@ -29,7 +29,8 @@ class FrameWarnings {
   std::vector<std::string> Check(const Scene& scene, const Player& player, int frame);
 
  private:
-  std::vector<std::string> RegroupedLinks(const Scene& scene, const Player& player, int frame, const std::string& at);
+  // The links that changed chains in `frame`, or an empty text.
+  std::string RegroupedLinks(const Scene& scene, const Player& player, int frame);
 
   bool uneven_ = false;
   bool heights_ = false;
