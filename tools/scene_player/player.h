@@ -36,8 +36,10 @@ class Player {
   // The host object of scene object `index`, or null while it is not on the
   // frame (not yet created, or destroyed).
   const HostObject* live(std::size_t index) const;
-  // The scene object that `object` is, or -1. Also finds objects destroyed in
-  // this frame, which stay readable until its handle call has run.
+  // The scene object that `object` is, or -1. Between frames the library's
+  // lists hold only objects on the frame: it drops the destroyed ones in the
+  // frame's step, before the host frees them and before any object can be
+  // made at a freed address, so an address found there names one object.
   int IndexOf(const HostObject* object) const;
 
   // The most chains the library has held at any moment of the run: a chain
