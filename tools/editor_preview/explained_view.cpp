@@ -227,6 +227,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
   const int32_t cx = WrapAdd(rect.left, WrapSub(rect.right, rect.left) / 2);
   const int32_t cy = WrapAdd(rect.top, WrapSub(rect.bottom, rect.top) / 2);
   const Arc arc = PlatformArc(chain);
+  const std::string swing = std::to_string(std::abs(int64_t{chain.angle}));  // the platforms' angle either side
   const bool placesLinks = isTemplate && settings.linkCount <= kMostLinks;
   const RunTimeChain runTime = placesLinks ? PlaceRunTimeChain(settings, cx, cy) : RunTimeChain{};
 
@@ -260,8 +261,8 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
                            std::to_string(settings.linkCount) + " links + 1): from the anchor's centre to each "
                            "platform's centre",
                        kBlack});
-    caption.push_back({"green: the arc the platform travels, drawn at -" + std::to_string(chain.angle) + ", 0 and +" +
-                           std::to_string(chain.angle) + " degrees; positive angles swing to the left (smaller x)",
+    caption.push_back({"green: the arc the platform travels, drawn at -" + swing + ", 0 and +" + swing +
+                           " degrees; positive angles swing to the left (smaller x)",
                        kArc});
     const double startAngle = ParseDecimalPrefix(settings.startAngleText);
     caption.push_back({placesLinks ? "orange: the links and the platform as the run-time step places them at the "
@@ -341,7 +342,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
     for (const auto& [degrees, sign] : ends) {
       const auto [dx, dy] = ArcOffset(arc, degrees);
       paint.Text(cx + dx, cy + dy + std::abs(static_cast<double>(settings.platformHeight)) / 2.0 + 4 / scale,
-                 sign + std::to_string(std::abs(int64_t{chain.angle})) + " degrees", kArc, true);
+                 sign + swing + " degrees", kArc, true);
     }
   }
   if (placesLinks) {
