@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "event_names.h"
+#include "messages.h"
 
 namespace scene_player {
 
@@ -10,8 +11,6 @@ namespace {
 
 // Expression codes whose parameters are not a chain index alone.
 constexpr int kPlatformX = 8, kPlatformY = 9, kChainIndex = 10, kLinkIndex = 14, kLinkX = 15, kLinkY = 16;
-
-std::string Counted(uint32_t count, const char* thing) { return std::to_string(count) + " " + thing + "s"; }
 
 // Why `index` addresses none of `count` things, or an empty text.
 std::string Missing(int32_t index, uint32_t count, const char* thing, const char* ofWhat = "") {

@@ -39,10 +39,6 @@ using tool_input::Shown;
 // memory, and no scene within the format's limits needs more.
 constexpr std::size_t kMaxSceneMegabytes = 16;
 
-std::string Counted(long count, const char* thing) {
-  return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
-}
-
 struct Run {
   const Scene& scene;
   const Options& options;

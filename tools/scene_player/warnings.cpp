@@ -8,6 +8,7 @@
 #include <tuple>
 #include <utility>
 
+#include "messages.h"
 #include "shown_text.h"
 
 namespace scene_player {
@@ -166,8 +167,7 @@ std::vector<std::string> RuleWarnings(const Scene& scene, const Player& player) 
     if (chain >= 0 && static_cast<uint32_t>(chain) < mostChains) continue;
     warnings.push_back("onSwing[" + std::to_string(i) + "].chain: the rule is for chain " + std::to_string(chain) +
                        (chain < 0 ? ", but chain numbers count from 0"
-                                  : ", but the scene never had more than " + std::to_string(mostChains) +
-                                        (mostChains == 1 ? " chain" : " chains")) +
+                                  : ", but the scene never had more than " + Counted(mostChains, "chain")) +
                        ": it never ran");
   }
   return warnings;
