@@ -103,12 +103,6 @@ RunTimeChain PlaceRunTimeChain(const EditData& settings, int32_t cx, int32_t cy)
   return chain;
 }
 
-std::string Degrees(double value) {
-  char text[32];
-  std::snprintf(text, sizeof text, "%g", value);
-  return text;
-}
-
 struct CaptionLine {
   std::string text;
   Colour colour;
@@ -266,7 +260,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
                        kArc});
     const double startAngle = ParseDecimalPrefix(settings.startAngleText);
     caption.push_back({placesLinks ? "orange: the links and the platform as the run-time step places them at the "
-                                     "starting angle, " + Degrees(static_cast<float>(startAngle)) + " degrees"
+                                     "starting angle, " + tool_input::ShownNumber(static_cast<float>(startAngle)) + " degrees"
                                    : "the links are not placed: more than " + std::to_string(kMostLinks),
                        kRunTime});
   } else if (settings.viewTemplate == 0) {

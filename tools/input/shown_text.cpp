@@ -58,4 +58,10 @@ std::string Shown(std::string_view text) {
   return shown;
 }
 
+std::string ShownNumber(double value) {
+  char text[32];
+  std::snprintf(text, sizeof text, "%g", value);
+  return text;
+}
+
 }  // namespace tool_input

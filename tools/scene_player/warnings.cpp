@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <charconv>
 #include <cmath>
-#include <cstdio>
 #include <optional>
 #include <tuple>
 #include <utility>
@@ -15,16 +14,12 @@ namespace scene_player {
 
 namespace {
 
+using tool_input::ShownNumber;
+
 constexpr double kFullTurn = 360.0;
 
 std::string Quoted(const Scene& scene, int object) {
   return "\"" + tool_input::Shown(scene.objects[static_cast<std::size_t>(object)].name) + "\"";
-}
-
-std::string Number(double value) {
-  char text[32];
-  std::snprintf(text, sizeof text, "%g", value);
-  return text;
 }
 
 // Whether the text, all of it but blanks around it, is a decimal number.
@@ -66,13 +61,13 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& rd) 
     const std::string start = std::string("settings.") + key + ": the text \"" + tool_input::Shown(text) + "\" ";
     if (!IsNumber(text)) {
       warnings.push_back(start + "is not a number; the library reads the number it starts with, here " +
-                         Number(stored));
+                         ShownNumber(stored));
     } else if (!std::isfinite(stored)) {
-      warnings.push_back(start + "is beyond the range of a float; the library reads it as " + Number(stored));
+      warnings.push_back(start + "is beyond the range of a float; the library reads it as " + ShownNumber(stored));
     }
   }
   if (std::isfinite(rd.startAngle) && std::fabs(rd.startAngle) > kFullTurn) {
-    warnings.push_back("settings.startAngle: every chain starts " + Number(rd.startAngle) +
+    warnings.push_back("settings.startAngle: every chain starts " + ShownNumber(rd.startAngle) +
                        " degrees from hanging straight down, more than a full turn (360)");
   }
   return warnings;
@@ -117,15 +112,15 @@ std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& 
   }
   if (Appears(spinning.has_value(), spinning_)) {
     warnings.push_back(At(frame) + "chain " + std::to_string(spinning->first) + " turns " +
-                       Number(spinning->second) + " degrees in one frame, more than a full turn: its gravity x mass "
-                       "is far too large for its length, or its speed was set so");
+                       ShownNumber(spinning->second) + " degrees in one frame, more than a full turn: its gravity "
+                       "x mass is far too large for its length, or its speed was set so");
   }
   if (std::string regrouped = RegroupedLinks(scene, player, frame); !regrouped.empty()) {
     warnings.push_back(std::move(regrouped));
   }
   if (Appears(notFinite.has_value(), notFinite_)) {
     warnings.push_back(At(frame) + "chain " + std::to_string(notFinite->first) +
-                       " holds a value that is no longer finite (" + Number(notFinite->second) +
+                       " holds a value that is no longer finite (" + ShownNumber(notFinite->second) +
                        "): what follows from it is not finite either");
   }
   return warnings;
