@@ -66,7 +66,8 @@ void Play(const Run& run) {
   // so that each frame finds its own without a look at the others.
   std::vector<const PngOutput*> pngs;
   for (const PngOutput& png : run.pngs) pngs.push_back(&png);
-  std::stable_sort(pngs.begin(), pngs.end(), [](const PngOutput* a, const PngOutput* b) { return a->frame < b->frame; });
+  std::stable_sort(pngs.begin(), pngs.end(),
+                   [](const PngOutput* a, const PngOutput* b) { return a->frame < b->frame; });
   auto nextPng = pngs.begin();
   for (int frame = 0; frame < run.frames; ++frame) {
     player.PlayFrame(frame);
