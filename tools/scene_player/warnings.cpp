@@ -1,6 +1,5 @@
 #include "warnings.h"
 
-#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <optional>
