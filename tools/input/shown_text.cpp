@@ -58,6 +58,15 @@ std::string Shown(std::string_view text) {
   return shown;
 }
 
+std::string Quoted(std::string_view text) {
+  // Appended rather than concatenated: GCC 12 takes "\"" + string for an
+  // overlapping copy and warns.
+  std::string quoted = "\"";
+  quoted += Shown(text);
+  quoted += '"';
+  return quoted;
+}
+
 std::string ShownNumber(double value) {
   char text[32];
   std::snprintf(text, sizeof text, "%g", value);

@@ -4,6 +4,7 @@
 
 #include "event_names.h"
 #include "messages.h"
+#include "shown_text.h"
 
 namespace scene_player {
 
@@ -26,8 +27,6 @@ std::string Missing(int32_t index, uint32_t count, const char* thing, int32_t of
          ") at that moment";
 }
 
-std::string Named(const char* text) { return "\"" + std::string(text) + "\""; }
-
 }  // namespace
 
 std::string MissedByAction(const RunData& rd, int code, int32_t first) {
@@ -37,7 +36,8 @@ std::string MissedByAction(const RunData& rd, int code, int32_t first) {
   }
   const std::string missing = Missing(first, ChainCount(rd), "chain");
   if (missing.empty()) return "";
-  return Named(action.menuText ? action.menuText : action.displayText) + " addresses " + missing + ": it does nothing";
+  return tool_input::Quoted(action.menuText ? action.menuText : action.displayText) + " addresses " + missing +
+         ": it does nothing";
 }
 
 std::string MissedByExpression(const RunData& rd, int code, const int32_t (&params)[2]) {
@@ -56,7 +56,7 @@ std::string MissedByExpression(const RunData& rd, int code, const int32_t (&para
     missing = Missing(params[0], ChainCount(rd), "chain");
   }
   if (missing.empty()) return "";
-  return Named(expression.displayText) + " asks for " + missing + ": " + answer;
+  return tool_input::Quoted(expression.displayText) + " asks for " + missing + ": " + answer;
 }
 
 }  // namespace scene_player

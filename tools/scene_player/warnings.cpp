@@ -18,7 +18,7 @@ using tool_input::ShownNumber;
 constexpr double kFullTurn = 360.0;
 
 std::string Quoted(const Scene& scene, int object) {
-  return "\"" + tool_input::Shown(scene.objects[static_cast<std::size_t>(object)].name) + "\"";
+  return tool_input::Quoted(scene.objects[static_cast<std::size_t>(object)].name);
 }
 
 // Whether the text, all of it but blanks around it, is a decimal number.
@@ -57,7 +57,7 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& rd) 
                               {"linkSpacing", scene.settings.linkSpacing, rd.defaultLinkSpacing}};
   std::vector<std::string> warnings;
   for (const auto& [key, text, stored] : settings) {
-    const std::string start = std::string("settings.") + key + ": the text \"" + tool_input::Shown(text) + "\" ";
+    const std::string start = std::string("settings.") + key + ": the text " + tool_input::Quoted(text) + " ";
     if (!IsNumber(text)) {
       warnings.push_back(start + "is not a number; the library reads the number it starts with, here " +
                          ShownNumber(stored));
