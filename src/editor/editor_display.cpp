@@ -4,12 +4,12 @@
 
 #include "chains/float_math.h"
 #include "editor/drawing_services.h"
+#include "editor/template_reading.h"
 #include "editor/wrapping_arithmetic.h"
 #include "frame/edit_data.h"
 #include "frame/exports.h"
 #include "frame/host_services.h"
 #include "frame/module.h"
-#include "frame/setting_text.h"
 #include "resources/resource_ids.h"
 
 namespace {
@@ -18,15 +18,8 @@ namespace {
 // wrapping arithmetic (editor/wrapping_arithmetic.h).
 int32_t Half(int32_t value) { return value / 2; }  // toward zero; never overflows
 
-// A setting text parsed as the run-time object parses it (decimal only), then
-// truncated toward zero straight from the double, without the run-time
-// object's rounding to a float. Beyond the int32 range (a text such as
-// "1e999") it saturates.
-int32_t SettingInteger(const char (&text)[kSettingTextSize]) {
-  return TruncateToInt(ParseDecimalPrefix(text), 0);
-}
-
-// cx + R cos(angle) or cy + R sin(angle), saturated as above when R is huge.
+// cx + R cos(angle) or cy + R sin(angle), saturated at the int32 range when R
+// is huge.
 int32_t OnArc(int32_t centre, int32_t radius, double trig) {
   return TruncateToInt(static_cast<double>(radius) * trig + static_cast<double>(centre), 0);
 }
@@ -123,8 +116,7 @@ TAVRIN_EXPORT void TVCALL EditorDisplay(EditorHost* host, void*, void* placed, E
 
   const int32_t spacing = SettingInteger(edit->linkSpacingText);
   const int32_t angle = SettingInteger(edit->startAngleText);
-  // Each link adds its height and the spacing; there is one step more than links.
-  const int32_t radius = WrapMul(WrapAdd(edit->linkHeight, spacing), WrapAdd(edit->linkCount, 1));
+  const int32_t radius = TemplateRadius(*edit, spacing);
 
   // The sizes are 16-bit fields and keep the low 16 bits.
   if (edit->viewTemplate == 1) {

@@ -76,25 +76,28 @@ TEST(SceneAuthoringTest, RepeatingEntryPlaysAsTheSameStepsWrittenFrameByFrame) {
 }
 
 // Every kind of warning, each once although its cause lasts or recurs: the
-// repeating entry addresses a chain that is not there at every frame. The
-// link created at frame 6 under a destroyed link's name is added again.
+// repeating entry addresses a chain that is not there at every frame. Link
+// l1, added again at frame 3, is in both chains from then on. The link
+// created at frame 6 under a destroyed link's name is added again. Chain 2
+// lives for one frame: its rule destroys its anchor.
 TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
   Folder folder;
   folder.Write("scene.json", R"({"frames": 5, "frames": 8, "settings": {"gravity": "9.8x", "startAngle": "400"},
     "objects": )" + Objects({{"a", 10, 10, 4, 4}, {"b", 50, 10, 4, 4}, {"l1", 0, 0, 4, 10}, {"l2", 0, 0, 4, 12},
-                               {"l3", 0, 0, 4, 10}, {"l4", 0, 0, 4, 10}, {"p", 0, 0, 4, 4}}) + R"(,
+                               {"l3", 0, 0, 4, 10}, {"p", 0, 0, 4, 4}}) + R"(,
     "timeline": [{"frame": 0, "do": [{"action": "Add Anchor", "params": ["a"]}, {"action": "Add Anchor", "params": ["b"]},
       {"action": "Add Link", "params": ["l1"]}, {"action": "Add Link", "params": ["l2"]},
       {"action": "Add Link", "params": ["l3"]}, {"action": "Start All"},
       {"move": "p", "by": [{"expression": "PlatformX(", "params": [0]}, 0]}]},
       {"every": 1, "from": 0, "do": [{"action": "Stop Chain", "params": [5]}]},
       {"frame": 2, "do": [{"action": "Set Angle", "params": [1, 1e39]}]},
-      {"frame": 3, "do": [{"action": "Add Link", "params": ["l4"]}]},
+      {"frame": 3, "do": [{"action": "Add Link", "params": ["l1"]}]},
       {"frame": 4, "do": [{"action": "Set Speed at index %0 to %1", "params": [0, 500]}]},
-      {"frame": 5, "do": [{"destroy": "l1"}, {"destroy": "l2"}, {"destroy": "l3"}, {"destroy": "l4"}]},
+      {"frame": 5, "do": [{"destroy": "l1"}, {"destroy": "l2"}, {"destroy": "l3"}]},
       {"frame": 6, "do": [{"create": {"name": "l1", "x": 0, "y": 0, "width": 4, "height": 10}},
-        {"action": "Add Link", "params": ["l1"]}]}],
-    "onSwing": [{"chain": 2, "do": []}]})");
+        {"action": "Add Link", "params": ["l1"]}]},
+      {"frame": 7, "do": [{"action": "Add Anchor", "params": ["p"]}, {"action": "Start Chain", "params": [2]}]}],
+    "onSwing": [{"chain": 2, "do": [{"destroy": "p"}]}, {"chain": 3, "do": []}]})");
   const ToolRun run = RunPlayer({"scene.json"}, folder);
   EXPECT_EQ(run.status, 0);
   const std::vector<std::string> expected = {
@@ -111,7 +114,7 @@ TEST(SceneAuthoringTest, WarnsOnceInOneLineOfWhatTheLibraryDoesAndPlaysOn) {
       "frame 4: warning: chain 0 turns 499.798 degrees in one frame, more than a full turn",
       "frame 5: warning: a chain swings with no links at all",
       "frame 6: warning: 1 link does not divide evenly among 2 chains",
-      "onSwing[0].chain: warning: the rule is for chain 2, but the scene never had more than 2 chains"};
+      "onSwing[1].chain: warning: the rule is for chain 3, but the scene never had more than 3 chains"};
   const std::vector<std::string> lines = Lines(run.err);
   ASSERT_EQ(lines.size(), expected.size()) << run.err;
   for (std::size_t i = 0; i < lines.size(); ++i) {

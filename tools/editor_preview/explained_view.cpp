@@ -9,6 +9,8 @@
 #include <memory>
 #include <sstream>
 #include <stdexcept>
+#include <string>
+#include <utility>
 
 #include "chain_template.h"
 #include "editor/wrapping_arithmetic.h"
@@ -101,12 +103,6 @@ RunTimeChain PlaceRunTimeChain(const EditData& settings, int32_t cx, int32_t cy)
   return chain;
 }
 
-std::string Degrees(double value) {
-  char text[32];
-  std::snprintf(text, sizeof text, "%g", value);
-  return text;
-}
-
 struct CaptionLine {
   std::string text;
   Colour colour;
@@ -118,6 +114,13 @@ struct Arc {
   double from = 0, to = 0;
   double radius = 0;
 };
+
+double Radians(double degrees) { return degrees * kPi / 180; }
+
+// The point of the arc at `degrees`, from its centre.
+std::pair<double, double> ArcOffset(const Arc& arc, double degrees) {
+  return {arc.radius * std::cos(Radians(degrees)), arc.radius * std::sin(Radians(degrees))};
+}
 
 Arc PlatformArc(const ChainTemplate& chain) {
   Arc arc;
@@ -198,6 +201,11 @@ class Painter {
   cairo_t* cr_;
 };
 
+void UseCaptionFont(cairo_t* cr) {
+  cairo_select_font_face(cr, "sans-serif", CAIRO_FONT_SLANT_NORMAL, CAIRO_FONT_WEIGHT_NORMAL);
+  cairo_set_font_size(cr, kFontSize);
+}
+
 struct CairoDeleter {
   void operator()(cairo_t* cr) const { cairo_destroy(cr); }
   void operator()(cairo_surface_t* surface) const { cairo_surface_destroy(surface); }
@@ -213,6 +221,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
   const int32_t cx = WrapAdd(rect.left, WrapSub(rect.right, rect.left) / 2);
   const int32_t cy = WrapAdd(rect.top, WrapSub(rect.bottom, rect.top) / 2);
   const Arc arc = PlatformArc(chain);
+  const std::string swing = std::to_string(std::abs(int64_t{chain.angle}));  // the platforms' angle either side
   const bool placesLinks = isTemplate && settings.linkCount <= kMostLinks;
   const RunTimeChain runTime = placesLinks ? PlaceRunTimeChain(settings, cx, cy) : RunTimeChain{};
 
@@ -223,8 +232,8 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
   AddDrawing(box, drawing.calls);
   if (isTemplate) {
     for (double degrees = arc.from; degrees <= arc.to; degrees += 1.0) {
-      box.Add(cx + std::llround(arc.radius * std::cos(degrees * kPi / 180)),
-              cy + std::llround(arc.radius * std::sin(degrees * kPi / 180)));
+      const auto [dx, dy] = ArcOffset(arc, degrees);
+      box.Add(cx + std::llround(dx), cy + std::llround(dy));
     }
     for (const POINT& link : runTime.links) box.AddCentred(link.x, link.y, settings.linkWidth, settings.linkHeight);
     if (placesLinks) {
@@ -246,12 +255,12 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
                            std::to_string(settings.linkCount) + " links + 1): from the anchor's centre to each "
                            "platform's centre",
                        kBlack});
-    caption.push_back({"green: the arc the platform travels, drawn at -" + std::to_string(chain.angle) + ", 0 and +" +
-                           std::to_string(chain.angle) + " degrees; positive angles swing to the left (smaller x)",
+    caption.push_back({"green: the arc the platform travels, drawn at -" + swing + ", 0 and +" + swing +
+                           " degrees; positive angles swing to the left (smaller x)",
                        kArc});
     const double startAngle = ParseDecimalPrefix(settings.startAngleText);
     caption.push_back({placesLinks ? "orange: the links and the platform as the run-time step places them at the "
-                                     "starting angle, " + Degrees(static_cast<float>(startAngle)) + " degrees"
+                                     "starting angle, " + tool_input::ShownNumber(static_cast<float>(startAngle)) + " degrees"
                                    : "the links are not placed: more than " + std::to_string(kMostLinks),
                        kRunTime});
   } else if (settings.viewTemplate == 0) {
@@ -291,8 +300,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
   {
     const std::unique_ptr<cairo_surface_t, CairoDeleter> scratch(cairo_image_surface_create(CAIRO_FORMAT_RGB24, 1, 1));
     const std::unique_ptr<cairo_t, CairoDeleter> cr(cairo_create(scratch.get()));
-    cairo_select_font_face(cr.get(), "sans-serif", CAIRO_FONT_SLANT_NORMAL, CAIRO_FONT_WEIGHT_NORMAL);
-    cairo_set_font_size(cr.get(), kFontSize);
+    UseCaptionFont(cr.get());
     for (const CaptionLine& line : caption) {
       cairo_text_extents_t extents;
       cairo_text_extents(cr.get(), line.text.c_str(), &extents);
@@ -308,8 +316,7 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
   const std::unique_ptr<cairo_t, CairoDeleter> cr(cairo_create(surface.get()));
   cairo_set_source_rgb(cr.get(), 1, 1, 1);
   cairo_paint(cr.get());
-  cairo_select_font_face(cr.get(), "sans-serif", CAIRO_FONT_SLANT_NORMAL, CAIRO_FONT_WEIGHT_NORMAL);
-  cairo_set_font_size(cr.get(), kFontSize);
+  UseCaptionFont(cr.get());
   Painter paint(cr.get());
   for (std::size_t i = 0; i < caption.size(); ++i) {
     paint.Text(kCaptionPad, kCaptionPad + kLineHeight * static_cast<double>(i), caption[i].text, caption[i].colour);
@@ -323,14 +330,13 @@ PictureSize WriteExplainedView(std::FILE* stream, const PreviewOptions& options,
   cairo_translate(cr.get(), static_cast<double>(-box.left), static_cast<double>(-box.top));
   if (isTemplate && arc.radius > 0) {
     cairo_new_sub_path(cr.get());
-    cairo_arc(cr.get(), cx, cy, arc.radius, arc.from * kPi / 180, arc.to * kPi / 180);
+    cairo_arc(cr.get(), cx, cy, arc.radius, Radians(arc.from), Radians(arc.to));
     paint.Stroke(kArc);
     const std::pair<double, std::string> ends[] = {{arc.from, "-"}, {arc.to, "+"}};
     for (const auto& [degrees, sign] : ends) {
-      const double x = cx + arc.radius * std::cos(degrees * kPi / 180);
-      const double y = cy + arc.radius * std::sin(degrees * kPi / 180);
-      paint.Text(x, y + std::abs(static_cast<double>(settings.platformHeight)) / 2.0 + 4 / scale,
-                 sign + std::to_string(std::abs(int64_t{chain.angle})) + " degrees", kArc, true);
+      const auto [dx, dy] = ArcOffset(arc, degrees);
+      paint.Text(cx + dx, cy + dy + std::abs(static_cast<double>(settings.platformHeight)) / 2.0 + 4 / scale,
+                 sign + swing + " degrees", kArc, true);
     }
   }
   if (placesLinks) {

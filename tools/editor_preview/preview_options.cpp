@@ -1,6 +1,5 @@
 #include "preview_options.h"
 
-#include <charconv>
 #include <cstring>
 #include <limits>
 
@@ -68,16 +67,13 @@ constexpr OptionSpec kOptions[] = {
 };
 
 int64_t ReadNumber(const std::string& option, const std::string& text, int64_t low, int64_t high) {
-  int64_t value = 0;
-  const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), value);
-  if (error != std::errc() || end != text.data() + text.size()) {
-    throw UsageError(option + " " + Shown(text) + ": not a whole number");
-  }
-  if (value < low || value > high) {
+  const std::optional<int64_t> value = tool_input::WholeNumber(text);
+  if (!value) throw UsageError(option + " " + Shown(text) + ": not a whole number");
+  if (*value < low || *value > high) {
     throw UsageError(option + " " + Shown(text) + ": out of range " + std::to_string(low) + " to " +
                      std::to_string(high));
   }
-  return value;
+  return *value;
 }
 
 int32_t ReadInt(const std::string& option, const std::string& text) {

@@ -1,6 +1,7 @@
 #include "command_line.h"
 
 #include <algorithm>
+#include <charconv>
 #include <cstring>
 
 #include "shown_text.h"
@@ -67,6 +68,14 @@ std::vector<Argument> ReadCommandLine(int argc, const char* const* argv, std::sp
     arguments.push_back(std::move(argument));
   }
   return arguments;
+}
+
+std::optional<int64_t> WholeNumber(std::string_view text) {
+  int64_t value = 0;
+  const char* end = text.data() + text.size();
+  const auto [stop, error] = std::from_chars(text.data(), end, value);
+  if (error != std::errc() || stop != end) return std::nullopt;
+  return value;
 }
 
 }  // namespace tool_input

@@ -4,9 +4,12 @@
 // output). An option that takes one value may be given once.
 #pragma once
 
+#include <cstdint>
+#include <optional>
 #include <span>
 #include <stdexcept>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace tool_input {
@@ -37,5 +40,9 @@ struct Argument {
 // Throws UsageError for an unknown option, a missing or empty value, a value
 // given to an option that takes none, and a one-value option given twice.
 std::vector<Argument> ReadCommandLine(int argc, const char* const* argv, std::span<const OptionSpec> options);
+
+// A whole decimal number that is all of `text` (a '-' but no '+' or blank),
+// or nothing.
+std::optional<int64_t> WholeNumber(std::string_view text);
 
 }  // namespace tool_input

@@ -58,4 +58,19 @@ std::string Shown(std::string_view text) {
   return shown;
 }
 
+std::string Quoted(std::string_view text) {
+  // Appended rather than concatenated: GCC 12 takes "\"" + string for an
+  // overlapping copy and warns.
+  std::string quoted = "\"";
+  quoted += Shown(text);
+  quoted += '"';
+  return quoted;
+}
+
+std::string ShownNumber(double value) {
+  char text[32];
+  std::snprintf(text, sizeof text, "%g", value);
+  return text;
+}
+
 }  // namespace tool_input

@@ -13,4 +13,11 @@ constexpr std::size_t kShownLength = 120;  // bytes of text kept before "..."
 
 std::string Shown(std::string_view text);
 
+// The text shown as above, in double quotes: "name".
+std::string Quoted(std::string_view text);
+
+// A number as a message shows it, as printf's "%g" does: 9.8, 499.798,
+// 1e+39, inf.
+std::string ShownNumber(double value);
+
 }  // namespace tool_input

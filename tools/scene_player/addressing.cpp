@@ -3,6 +3,8 @@
 #include <cstring>
 
 #include "event_names.h"
+#include "messages.h"
+#include "shown_text.h"
 
 namespace scene_player {
 
@@ -11,20 +13,19 @@ namespace {
 // Expression codes whose parameters are not a chain index alone.
 constexpr int kPlatformX = 8, kPlatformY = 9, kChainIndex = 10, kLinkIndex = 14, kLinkX = 15, kLinkY = 16;
 
-std::string Counted(uint32_t count, const char* thing) { return std::to_string(count) + " " + thing + "s"; }
-
-// Why `index` addresses none of `count` things, or an empty text.
-std::string Missing(int32_t index, uint32_t count, const char* thing, const char* ofWhat = "") {
+// Why `index` addresses none of `count` things (of chain `ofChain`, when it
+// is one), or an empty text. Nothing is written for an index that is there,
+// which is what every step of most scenes asks for.
+std::string Missing(int32_t index, uint32_t count, const char* thing, int32_t ofChain = -1) {
   if (index >= 0 && static_cast<uint32_t>(index) < count) return "";
-  const std::string asked = std::string(thing) + " " + std::to_string(index) + ofWhat;
+  std::string asked = std::string(thing) + " " + std::to_string(index);
+  if (ofChain >= 0) asked += " of chain " + std::to_string(ofChain);
   if (index < 0) return asked + ", but " + thing + " numbers count from 0";
   if (count == 0) return asked + ", but there is no " + thing + " at that moment";
   if (count == 1) return asked + ", but there is only " + thing + " 0 at that moment";
   return asked + ", but there are only " + Counted(count, thing) + " (0 to " + std::to_string(count - 1) +
          ") at that moment";
 }
-
-std::string Named(const char* text) { return "\"" + std::string(text) + "\""; }
 
 }  // namespace
 
@@ -35,7 +36,8 @@ std::string MissedByAction(const RunData& rd, int code, int32_t first) {
   }
   const std::string missing = Missing(first, ChainCount(rd), "chain");
   if (missing.empty()) return "";
-  return Named(action.menuText ? action.menuText : action.displayText) + " addresses " + missing + ": it does nothing";
+  return tool_input::Quoted(action.menuText ? action.menuText : action.displayText) + " addresses " + missing +
+         ": it does nothing";
 }
 
 std::string MissedByExpression(const RunData& rd, int code, const int32_t (&params)[2]) {
@@ -48,13 +50,13 @@ std::string MissedByExpression(const RunData& rd, int code, const int32_t (&para
   } else if (code == kLinkX || code == kLinkY) {
     missing = Missing(params[0], ChainCount(rd), "chain");
     if (missing.empty()) {
-      missing = Missing(params[1], LinksPerChain(rd), "link", (" of chain " + std::to_string(params[0])).c_str());
+      missing = Missing(params[1], LinksPerChain(rd), "link", params[0]);
     }
   } else if (expression.paramCount == 1 && code != kChainIndex && code != kLinkIndex) {
     missing = Missing(params[0], ChainCount(rd), "chain");
   }
   if (missing.empty()) return "";
-  return Named(expression.displayText) + " asks for " + missing + ": " + answer;
+  return tool_input::Quoted(expression.displayText) + " asks for " + missing + ": " + answer;
 }
 
 }  // namespace scene_player

@@ -50,8 +50,8 @@ class DocumentBuilder : public nlohmann::detail::json_sax_dom_parser<json> {
     Level& level = levels_.back();
     level.key = name;
     if (!level.keys.insert(name).second) {
-      warnings_.push_back(Place() + ": the key \"" + tool_input::Shown(name) +
-                          "\" is given twice in one object; only the last is used");
+      warnings_.push_back(Place() + ": the key " + tool_input::Quoted(name) +
+                          " is given twice in one object; only the last is used");
     }
     return Base::key(name);
   }

@@ -39,10 +39,6 @@ using tool_input::Shown;
 // memory, and no scene within the format's limits needs more.
 constexpr std::size_t kMaxSceneMegabytes = 16;
 
-std::string Counted(long count, const char* thing) {
-  return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
-}
-
 struct Run {
   const Scene& scene;
   const Options& options;
@@ -66,14 +62,21 @@ void Play(const Run& run) {
   Messages& messages = run.messages;
   messages.Warn(SettingWarnings(scene, player.extension()));
   FrameWarnings frameWarnings;
+  // The pictures in frame order (those of one frame in the command line's),
+  // so that each frame finds its own without a look at the others.
+  std::vector<const PngOutput*> pngs;
+  for (const PngOutput& png : run.pngs) pngs.push_back(&png);
+  std::stable_sort(pngs.begin(), pngs.end(),
+                   [](const PngOutput* a, const PngOutput* b) { return a->frame < b->frame; });
+  auto nextPng = pngs.begin();
   for (int frame = 0; frame < run.frames; ++frame) {
     player.PlayFrame(frame);
     messages.Warn(player.TakeWarnings());
     messages.Warn(frameWarnings.Check(scene, player, frame));
     const Picture& picture = renderer.Render(player, frame);
     gif.AddFrame(picture);
-    for (const PngOutput& png : run.pngs) {
-      if (png.frame != frame) continue;
+    for (; nextPng != pngs.end() && (*nextPng)->frame == frame; ++nextPng) {
+      const PngOutput& png = **nextPng;
       // Written and closed at once: a run of many pictures holds no more
       // than one open, and all are named only when the run has succeeded.
       pngFiles.push_back(std::make_unique<OutputFile>(png.path));
@@ -83,7 +86,7 @@ void Play(const Run& run) {
     if (traceFile) WriteTraceLine(traceFile->stream(), frame, scene, player);
     messages.Progress(frame, run.frames);
   }
-  messages.Warn(frameWarnings.Finish(scene));
+  messages.Warn(RuleWarnings(scene, player));
   messages.EndProgressLine();
   gif.Finish();
   gifFile.Close();

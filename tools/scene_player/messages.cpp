@@ -6,6 +6,10 @@
 
 namespace scene_player {
 
+std::string Counted(long count, const char* thing) {
+  return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
+}
+
 Messages::Messages(std::string sceneName)
     : sceneName_(std::move(sceneName)), progress_(isatty(STDERR_FILENO) == 1) {}
 

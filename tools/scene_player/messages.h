@@ -8,6 +8,9 @@
 
 namespace scene_player {
 
+// A count and its thing, plural unless one: "1 frame", "3 frames".
+std::string Counted(long count, const char* thing);
+
 class Messages {
  public:
   explicit Messages(std::string sceneName);

@@ -1,7 +1,5 @@
 #include "options.h"
 
-#include <charconv>
-
 #include "png_names.h"
 #include "shown_text.h"
 
@@ -28,6 +26,7 @@ namespace {
 
 using tool_input::OptionSpec;
 using tool_input::Shown;
+using tool_input::WholeNumber;
 using Takes = OptionSpec::Takes;
 
 constexpr OptionSpec kOptions[] = {
@@ -35,16 +34,6 @@ constexpr OptionSpec kOptions[] = {
     {"--trace", Takes::OneValue},      {"--frames", Takes::OneValue}, {"--print-demo"},
     {"--version"},                     {"--help", Takes::Nothing, false, "-h"},
 };
-
-// A whole number from `text`, all of it (a '-' but no '+' or blank); nothing
-// when it is not one.
-std::optional<long> Number(const std::string& text) {
-  long value = 0;
-  const char* end = text.data() + text.size();
-  const auto [stop, error] = std::from_chars(text.data(), end, value);
-  if (error != std::errc() || stop != end) return std::nullopt;
-  return value;
-}
 
 std::vector<FrameRange> ReadFrames(const std::string& text) {
   const UsageError error("--png-frame " + Shown(text) + ": expected a frame number, a range A-B or A-B/STEP, "
@@ -56,14 +45,14 @@ std::vector<FrameRange> ReadFrames(const std::string& text) {
     std::string part = text.substr(start, comma == std::string::npos ? std::string::npos : comma - start);
     FrameRange range;
     if (const auto slash = part.find('/'); slash != std::string::npos) {
-      const auto step = Number(part.substr(slash + 1));
+      const auto step = WholeNumber(part.substr(slash + 1));
       if (!step || *step < 1) throw error;
       range.step = *step;
       part.resize(slash);
     }
     const auto dash = part.find('-', 1);  // a first '-' is a sign
-    const auto first = Number(part.substr(0, dash));
-    const auto last = dash == std::string::npos ? first : Number(part.substr(dash + 1));
+    const auto first = WholeNumber(part.substr(0, dash));
+    const auto last = dash == std::string::npos ? first : WholeNumber(part.substr(dash + 1));
     if (!first || !last || *last < *first || (dash == std::string::npos && range.step != 1)) throw error;
     range.first = *first;
     range.last = *last;
@@ -105,7 +94,7 @@ Options ReadOptions(int argc, const char* const* argv) {
       png.framesText = value;
       png.frames = ReadFrames(value);
     } else if (option == "--frames") {
-      options.frames = Number(value);
+      options.frames = WholeNumber(value);
       if (!options.frames || *options.frames < 1) {
         throw UsageError("--frames " + Shown(value) + ": expected a number of frames, 1 or more");
       }

@@ -169,7 +169,9 @@ void Player::RunStep(const Step& step) {
   running_ = &step;
   switch (step.kind) {
     case Step::Kind::Action:
+      // Only actions add chains.
       RunAction(step);
+      mostChains_ = std::max(mostChains_, ChainCount(*extension_));
       return;
     case Step::Kind::Create:
       Create(static_cast<std::size_t>(step.object));

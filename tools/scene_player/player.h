@@ -36,9 +36,15 @@ class Player {
   // The host object of scene object `index`, or null while it is not on the
   // frame (not yet created, or destroyed).
   const HostObject* live(std::size_t index) const;
-  // The scene object that `object` is, or -1. Also finds objects destroyed in
-  // this frame, which stay readable until its handle call has run.
+  // The scene object that `object` is, or -1. Between frames the library's
+  // lists hold only objects on the frame: it drops the destroyed ones in the
+  // frame's step, before the host frees them and before any object can be
+  // made at a freed address, so an address found there names one object.
   int IndexOf(const HostObject* object) const;
+
+  // The most chains the library has held at any moment of the run: a chain
+  // may come and go within one frame (a rule destroys its anchor).
+  uint32_t mostChains() const { return mostChains_; }
 
   // What the steps run since the last call addressed that did not exist
   // ("PLACE: message"), each step and routine said once in the run.
@@ -82,6 +88,7 @@ class Player {
   int frame_ = 0;       // the frame being played, for {"count": "frame"}
   int repetition_ = 0;  // of the repeating entry being run, for {"count": "repetition"}
   const Step* running_ = nullptr;  // the step being run, for its warnings
+  uint32_t mostChains_ = 0;
   std::vector<std::string> warnings_;
   std::set<std::string> warned_;
   // An exception must not cross the library's swing step: one thrown while

@@ -31,7 +31,7 @@ constexpr std::size_t kSettingTextLength = 9;  // the stored field holds 9 chara
   throw SceneError(place.empty() ? "top level" : place, message);
 }
 
-std::string Quoted(std::string_view text) { return "\"" + tool_input::Shown(text) + "\""; }
+using tool_input::Quoted;
 
 // How a value found in the file is named in a message.
 std::string Described(const json& value) {

@@ -1,28 +1,24 @@
 #include "warnings.h"
 
-#include <algorithm>
 #include <charconv>
 #include <cmath>
-#include <cstdio>
 #include <optional>
+#include <tuple>
 #include <utility>
 
+#include "messages.h"
 #include "shown_text.h"
 
 namespace scene_player {
 
 namespace {
 
+using tool_input::ShownNumber;
+
 constexpr double kFullTurn = 360.0;
 
 std::string Quoted(const Scene& scene, int object) {
-  return "\"" + tool_input::Shown(scene.objects[static_cast<std::size_t>(object)].name) + "\"";
-}
-
-std::string Number(double value) {
-  char text[32];
-  std::snprintf(text, sizeof text, "%g", value);
-  return text;
+  return tool_input::Quoted(scene.objects[static_cast<std::size_t>(object)].name);
 }
 
 // Whether the text, all of it but blanks around it, is a decimal number.
@@ -37,6 +33,8 @@ bool IsNumber(const std::string& text) {
   return result.ptr == end && (result.ec == std::errc() || result.ec == std::errc::result_out_of_range) &&
          !std::isnan(value) && !std::isinf(value);
 }
+
+std::string At(int frame) { return "frame " + std::to_string(frame) + ": "; }
 
 // Whether a condition holds now but did not at the last check; remembers it.
 bool Appears(bool now, bool& before) {
@@ -59,16 +57,16 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& rd) 
                               {"linkSpacing", scene.settings.linkSpacing, rd.defaultLinkSpacing}};
   std::vector<std::string> warnings;
   for (const auto& [key, text, stored] : settings) {
-    const std::string start = std::string("settings.") + key + ": the text \"" + tool_input::Shown(text) + "\" ";
+    const std::string start = std::string("settings.") + key + ": the text " + tool_input::Quoted(text) + " ";
     if (!IsNumber(text)) {
       warnings.push_back(start + "is not a number; the library reads the number it starts with, here " +
-                         Number(stored));
+                         ShownNumber(stored));
     } else if (!std::isfinite(stored)) {
-      warnings.push_back(start + "is beyond the range of a float; the library reads it as " + Number(stored));
+      warnings.push_back(start + "is beyond the range of a float; the library reads it as " + ShownNumber(stored));
     }
   }
   if (std::isfinite(rd.startAngle) && std::fabs(rd.startAngle) > kFullTurn) {
-    warnings.push_back("settings.startAngle: every chain starts " + Number(rd.startAngle) +
+    warnings.push_back("settings.startAngle: every chain starts " + ShownNumber(rd.startAngle) +
                        " degrees from hanging straight down, more than a full turn (360)");
   }
   return warnings;
@@ -76,111 +74,94 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& rd) 
 
 std::vector<std::string> FrameWarnings::Check(const Scene& scene, const Player& player, int frame) {
   const RunData& rd = player.extension();
-  const std::string at = "frame " + std::to_string(frame) + ": ";
   std::vector<std::string> warnings;
 
   const uint32_t links = LinkCount(rd), chains = ChainCount(rd);
   if (Appears(chains > 0 && links % chains != 0, uneven_)) {
-    warnings.push_back(at + std::to_string(links) + (links == 1 ? " link does" : " links do") +
-                       " not divide evenly among " + std::to_string(chains) + " chains: each chain takes " + std::to_string(links / chains) +
-                       " in the order they were added, and the last " + std::to_string(links % chains) +
-                       " belong to no chain");
+    warnings.push_back(At(frame) + std::to_string(links) + (links == 1 ? " link does" : " links do") +
+                       " not divide evenly among " + std::to_string(chains) + " chains: each chain takes " +
+                       std::to_string(links / chains) + " in the order they were added, and the last " +
+                       std::to_string(links % chains) + " belong to no chain");
   }
 
-  // Heights from the scene: the objects in the list are those of the scene,
-  // and what the library knows of them never changes.
-  auto heightOf = [&](uint32_t j) {
-    const int index = player.IndexOf(rd.links->At(j));
-    return index < 0 ? -1 : scene.objects[static_cast<std::size_t>(index)].height;
-  };
+  // Every object in the lists is on the frame: the library dropped the
+  // destroyed ones before the host freed them.
+  const auto heightOf = [&](uint32_t j) { return rd.links->At(j)->head.height; };
   uint32_t other = 1;  // the first link whose height differs from the first's
   while (other < links && heightOf(other) == heightOf(0)) ++other;
   if (Appears(other < links, heights_)) {
-    warnings.push_back(at + "links of differing heights (" + std::to_string(heightOf(0)) + " and " +
+    warnings.push_back(At(frame) + "links of differing heights (" + std::to_string(heightOf(0)) + " and " +
                        std::to_string(heightOf(other)) + "): every chain's length comes from the height of the "
                        "first link added; each link is placed by its own height");
   }
 
-  mostChains_ = std::max(mostChains_, chains);
   bool swings = false;
-  std::optional<std::pair<uint32_t, float>> spinning;  // the first chain and its speed
+  std::optional<std::pair<uint32_t, float>> spinning, notFinite;  // the first chain and its value
   for (uint32_t i = 0; i < chains; ++i) {
     const ChainRecord& r = rd.chains->At(i);
     swings = swings || r.swinging == 1;
     if (!spinning && std::isfinite(r.speed) && std::fabs(r.speed) > kFullTurn) spinning = {i, r.speed};
-  }
-  if (Appears(swings && links == 0, noLinks_)) {
-    warnings.push_back(at + "a chain swings with no links at all (none were added, or all were destroyed): its "
-                            "length is then only its link spacing, and its platform hangs that close to its anchor");
-  }
-  if (Appears(spinning.has_value(), spinning_)) {
-    warnings.push_back(at + "chain " + std::to_string(spinning->first) + " turns " + Number(spinning->second) +
-                       " degrees in one frame, more than a full turn: its gravity x mass is far too large for its "
-                       "length, or its speed was set so");
-  }
-  for (std::string& warning : RegroupedLinks(scene, player, at)) warnings.push_back(std::move(warning));
-
-  std::optional<std::pair<uint32_t, float>> notFinite;  // the first chain and its value
-  for (uint32_t i = 0; i < chains && !notFinite; ++i) {
-    const ChainRecord& r = rd.chains->At(i);
     for (float value : {r.mass, r.angle, r.speed, r.linkSpacing, r.acceleration, r.platformX, r.platformY}) {
-      if (!std::isfinite(value)) {
-        notFinite = {i, value};
-        break;
-      }
+      if (!notFinite && !std::isfinite(value)) notFinite = {i, value};
     }
   }
+  if (Appears(swings && links == 0, noLinks_)) {
+    warnings.push_back(At(frame) + "a chain swings with no links at all (none were added, or all were destroyed): "
+                       "its length is then only its link spacing, and its platform hangs that close to its anchor");
+  }
+  if (Appears(spinning.has_value(), spinning_)) {
+    warnings.push_back(At(frame) + "chain " + std::to_string(spinning->first) + " turns " +
+                       ShownNumber(spinning->second) + " degrees in one frame, more than a full turn: its gravity "
+                       "x mass is far too large for its length, or its speed was set so");
+  }
+  if (std::string regrouped = RegroupedLinks(scene, player, frame); !regrouped.empty()) {
+    warnings.push_back(std::move(regrouped));
+  }
   if (Appears(notFinite.has_value(), notFinite_)) {
-    warnings.push_back(at + "chain " + std::to_string(notFinite->first) +
-                       " holds a value that is no longer finite (" + Number(notFinite->second) +
+    warnings.push_back(At(frame) + "chain " + std::to_string(notFinite->first) +
+                       " holds a value that is no longer finite (" + ShownNumber(notFinite->second) +
                        "): what follows from it is not finite either");
   }
   return warnings;
 }
 
-std::vector<std::string> FrameWarnings::RegroupedLinks(const Scene& scene, const Player& player, const std::string& at) {
+std::string FrameWarnings::RegroupedLinks(const Scene& scene, const Player& player, int frame) {
   const RunData& rd = player.extension();
-  std::vector<std::pair<int, int>> owned;  // (link, its chain's anchor), as scene objects
+  owners_.resize(scene.objects.size());
+  int moved = -1, from = -1, to = -1, count = 0;
   const uint32_t perChain = LinksPerChain(rd);
   for (uint32_t i = 0; i < ChainCount(rd); ++i) {
     const int anchor = player.IndexOf(rd.chains->At(i).anchor);
     for (uint32_t k = 0; k < perChain; ++k) {
       const int link = player.IndexOf(rd.links->At(perChain * i + k));
-      if (link >= 0 && anchor >= 0) owned.emplace_back(link, anchor);
+      if (link < 0 || anchor < 0) continue;
+      // A link added twice is in two places: the first is its chain.
+      Owner& owner = owners_[static_cast<std::size_t>(link)];
+      if (owner.frame == frame) continue;
+      if (owner.anchor >= 0 && owner.anchor != anchor) {
+        if (count++ == 0) std::tie(moved, from, to) = std::tuple(link, owner.anchor, anchor);
+      }
+      // A link keeps the chain it last belonged to while it belongs to none.
+      owner = {anchor, frame};
     }
   }
-  owners_.resize(scene.objects.size(), -1);
-  int moved = -1, count = 0;
-  for (const auto& [link, anchor] : owned) {
-    const int before = owners_[static_cast<std::size_t>(link)];
-    if (before < 0 || before == anchor) continue;
-    if (moved < 0) moved = link;
-    ++count;
-  }
-  std::vector<std::string> warnings;
-  if (moved >= 0) {
-    const int before = owners_[static_cast<std::size_t>(moved)];
-    const int after = std::find_if(owned.begin(), owned.end(), [&](const auto& o) { return o.first == moved; })->second;
-    warnings.push_back(at + "link " + Quoted(scene, moved) + " went from the chain of anchor " + Quoted(scene, before) +
-                       " to the chain of anchor " + Quoted(scene, after) +
-                       (count > 1 ? " (" + std::to_string(count) + " links changed chains)" : "") +
-                       ": the library shares the links out among the chains in the order they were added, so adding "
-                       "or removing a chain or a link regroups them");
-  }
-  // A link keeps the chain it last belonged to while it belongs to none.
-  for (const auto& [link, anchor] : owned) owners_[static_cast<std::size_t>(link)] = anchor;
-  return warnings;
+  if (count == 0) return {};
+  return At(frame) + "link " + Quoted(scene, moved) + " went from the chain of anchor " + Quoted(scene, from) +
+         " to the chain of anchor " + Quoted(scene, to) +
+         (count > 1 ? " (" + std::to_string(count) + " links changed chains)" : "") +
+         ": the library shares the links out among the chains in the order they were added, so adding or removing a "
+         "chain or a link regroups them";
 }
 
-std::vector<std::string> FrameWarnings::Finish(const Scene& scene) const {
+std::vector<std::string> RuleWarnings(const Scene& scene, const Player& player) {
+  const uint32_t mostChains = player.mostChains();
   std::vector<std::string> warnings;
   for (std::size_t i = 0; i < scene.rules.size(); ++i) {
     const int32_t chain = scene.rules[i].chain;
-    if (chain >= 0 && static_cast<uint32_t>(chain) < mostChains_) continue;
+    if (chain >= 0 && static_cast<uint32_t>(chain) < mostChains) continue;
     warnings.push_back("onSwing[" + std::to_string(i) + "].chain: the rule is for chain " + std::to_string(chain) +
                        (chain < 0 ? ", but chain numbers count from 0"
-                                  : ", but the scene never had more than " + std::to_string(mostChains_) +
-                                        (mostChains_ == 1 ? " chain" : " chains")) +
+                                  : ", but the scene never had more than " + Counted(mostChains, "chain")) +
                        ": it never ran");
   }
   return warnings;

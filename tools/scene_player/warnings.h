@@ -16,6 +16,9 @@ namespace scene_player {
 // ...". Called once the run-time object exists.
 std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& extension);
 
+// Once the run is over: the "On Swing" rules whose chain never existed.
+std::vector<std::string> RuleWarnings(const Scene& scene, const Player& player);
+
 // What a frame has left: links that do not divide evenly among the chains,
 // links of differing heights, a chain swinging with no links, a chain that
 // turns more than a full turn in a frame, chain values that are no longer
@@ -24,22 +27,24 @@ std::vector<std::string> SettingWarnings(const Scene& scene, const RunData& exte
 class FrameWarnings {
  public:
   std::vector<std::string> Check(const Scene& scene, const Player& player, int frame);
-  // Once the run is over: the "On Swing" rules whose chain never existed.
-  std::vector<std::string> Finish(const Scene& scene) const;
 
  private:
-  std::vector<std::string> RegroupedLinks(const Scene& scene, const Player& player, const std::string& at);
+  // The links that changed chains in `frame`, or an empty text.
+  std::string RegroupedLinks(const Scene& scene, const Player& player, int frame);
 
   bool uneven_ = false;
   bool heights_ = false;
   bool noLinks_ = false;
   bool spinning_ = false;
   bool notFinite_ = false;
-  uint32_t mostChains_ = 0;
   // For each scene object that has been a link of a chain, the scene object
   // of that chain's anchor at the end of the last frame it belonged to one
-  // (-1: never).
-  std::vector<int> owners_;
+  // (-1: never), and that frame.
+  struct Owner {
+    int anchor = -1;
+    int frame = -1;
+  };
+  std::vector<Owner> owners_;
 };
 
 }  // namespace scene_player
